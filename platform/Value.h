@@ -1,0 +1,175 @@
+#pragma once
+
+#include <chrono>
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <variant>
+#include <vector>
+
+namespace pelorus {
+
+/// A dictionary key: text that is either a literal of the program, then it costs nothing to copy and
+/// compares by address first, or shared text from outside.
+class Key {
+public:
+    explicit Key(std::string text) : owner(std::make_shared<const std::string>(std::move(text))), view(*owner)
+    {}
+    constexpr std::string_view text() const { return view; }
+    friend bool operator==(const Key& a, const Key& b) { return a == b.view; }
+    friend bool operator==(const Key& a, std::string_view b)
+    {
+        return a.view.size() == b.size() && (a.view.data() == b.data() || a.view == b);
+    }
+
+private:
+    struct Literal {};
+    constexpr Key(Literal, std::string_view literal) : view(literal) {}
+    friend struct Label;
+
+    std::shared_ptr<const std::string> owner;
+    std::string_view view;
+};
+
+/// A key that is a literal of the program: what the tables of the sections name their rows with.
+struct Label {
+    // NOLINTNEXTLINE(google-explicit-constructor): a literal is a label wherever one is asked for
+    template <std::size_t N> consteval Label(const char (&literal)[N]) : text(literal, N - 1) {}
+    std::string_view text;
+    Key key() const { return Key(Key::Literal{}, text); }
+};
+
+class Array;
+class Dictionary;
+
+/// Bytes that never change once they are a value, so that copies can share them.
+using Data = std::shared_ptr<const std::vector<std::byte>>;
+
+/// A moment, as property lists hold it.
+using Date = std::chrono::sys_time<std::chrono::microseconds>;
+
+/// One property-list value. Containers are shared and mutable: copying a value that holds one gives a second
+/// reference to the same container; deepCopy() gives a container of its own. The default value is nil, which
+/// no container may hold.
+class Value {
+public:
+    Value() = default;
+    Value(std::string text) : held(std::move(text)) {}
+    Value(std::string_view text) : held(std::string(text)) {}
+    Value(const char* text) : held(std::string(text)) {}
+    Value(std::int64_t number) : held(number) {}
+    Value(int number) : held(std::int64_t{number}) {}
+    Value(double number) : held(number) {}
+    Value(bool truth) : held(truth) {}
+    Value(Date date) : held(date) {}
+    Value(Data data) : held(std::move(data)) {}
+    Value(std::shared_ptr<Array> array) : held(std::move(array)) {}
+    Value(std::shared_ptr<Dictionary> dictionary) : held(std::move(dictionary)) {}
+
+    explicit operator bool() const { return held.index() != 0; }
+
+    /// The value as one kind, nullptr when it is of another.
+    const std::string* string() const { return std::get_if<std::string>(&held); }
+    const std::int64_t* integer() const { return std::get_if<std::int64_t>(&held); }
+    const double* real() const { return std::get_if<double>(&held); }
+    const bool* boolean() const { return std::get_if<bool>(&held); }
+    const Date* date() const { return std::get_if<Date>(&held); }
+    const std::vector<std::byte>* data() const { return pointee(std::get_if<Data>(&held)); }
+    Array* array() const { return pointee(std::get_if<std::shared_ptr<Array>>(&held)); }
+    Dictionary* dictionary() const { return pointee(std::get_if<std::shared_ptr<Dictionary>>(&held)); }
+    std::shared_ptr<Array> sharedArray() const;
+    std::shared_ptr<Dictionary> sharedDictionary() const;
+
+    /// The string to write into; a value of another kind becomes an empty string first.
+    std::string& text()
+    {
+        if (auto* present = std::get_if<std::string>(&held)) [[likely]]
+            return *present;
+        return held.emplace<std::string>();
+    }
+
+    /// Equal kind and equal content, containers compared element by element (dictionaries in any order).
+    friend bool operator==(const Value& a, const Value& b);
+
+private:
+    template <class Pointer> static auto pointee(const Pointer* pointer) -> decltype(pointer->get())
+    {
+        return pointer ? pointer->get() : nullptr;
+    }
+
+    std::variant<std::monostate, std::string, std::int64_t, double, bool, Date, Data, std::shared_ptr<Array>,
+                 std::shared_ptr<Dictionary>>
+        held;
+};
+
+class Array {
+public:
+    std::vector<Value> elements;
+};
+
+/// Keys to values, in the order in which the keys were first set.
+class Dictionary {
+public:
+    struct Entry {
+        Key key;
+        Value value;
+    };
+
+    /// nullptr when the key is absent.
+    const Value* find(std::string_view key) const;
+    Value* find(std::string_view key);
+    /// The value under a key, nil when it is absent.
+    Value at(std::string_view key) const;
+    void set(const Key& key, Value value) { slot(key) = std::move(value); }
+    void set(Label key, Value value) { slot(key) = std::move(value); }
+    void set(std::string_view key, Value value);
+    /// Where the value under a key is; a nil to be filled at once when the key was absent.
+    Value& slot(const Key& key);
+    Value& slot(Label key);
+    /// As slot(), looking first where the key was found the last time.
+    Value& slot(Label key, std::size_t& hint)
+    {
+        if (hint < entries.size() && entries[hint].key == key.text) [[likely]]
+            return entries[hint].value;
+        return slotElsewhere(key, hint);
+    }
+    void remove(std::string_view key);
+    void clear() { entries.clear(); }
+    void reserve(std::size_t count) { entries.reserve(count); }
+    /// Adds an entry whose key is known to be absent.
+    void append(Key key, Value value) { entries.push_back({std::move(key), std::move(value)}); }
+    std::size_t size() const { return entries.size(); }
+    bool empty() const { return entries.empty(); }
+    auto begin() const { return entries.begin(); }
+    auto end() const { return entries.end(); }
+
+private:
+    Value& slotElsewhere(Label key, std::size_t& hint);
+    std::vector<Entry> entries;
+};
+
+inline std::shared_ptr<Array> makeArray(std::vector<Value> elements = {})
+{
+    auto array = std::make_shared<Array>();
+    array->elements = std::move(elements);
+    return array;
+}
+
+inline std::shared_ptr<Dictionary> makeDictionary()
+{
+    return std::make_shared<Dictionary>();
+}
+std::shared_ptr<Dictionary> makeDictionary(std::initializer_list<std::pair<std::string_view, Value>> entries);
+Data makeData(std::vector<std::byte> bytes);
+
+/// A value that shares no container with the original. Data, which cannot change, stays shared.
+Value deepCopy(const Value& value);
+
+/// Reads a number as telephony servers send them: an integer, or a string of decimal digits with an optional
+/// sign. A value outside the signed 32-bit range keeps its low 32 bits. Nothing for any other value.
+std::optional<std::int32_t> signed32(const Value* value);
+
+} // namespace pelorus
