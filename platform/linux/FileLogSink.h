@@ -1,0 +1,29 @@
+#pragma once
+
+#include "platform/SystemLog.h"
+#include "platform/linux/FileDescriptor.h"
+
+#include <memory>
+#include <string>
+
+namespace pelorus {
+
+/// A file that gets each entry as "<P>", the text, and exactly one line feed. Each is in the file when
+/// write() returns, so that none is lost whatever ends the program.
+class FileLogSink : public SystemLogSink {
+public:
+    /// "-" is standard error; a file that exists is emptied. Null when the file cannot be opened; `why` is
+    /// then the reason, without the file's name.
+    static std::unique_ptr<FileLogSink> open(const std::string& path, std::string& why);
+    ~FileLogSink() override;
+    void write(int priority, std::string_view text) override;
+
+private:
+    FileLogSink(FileDescriptor file, bool owned) : file(std::move(file)), owned(owned) {}
+
+    FileDescriptor file;
+    bool owned;
+    std::string line; // reused
+};
+
+} // namespace pelorus

@@ -1,0 +1,47 @@
+#pragma once
+
+#include "platform/linux/PortConnection.h"
+#include "platform/linux/PortDirectory.h"
+
+#include <sys/types.h>
+
+class QLocalServer;
+
+namespace pelorus {
+
+/// A named port that others connect to: a socket file of mode 0600 in the port directory, there as long as
+/// the listener listens.
+class PortListener {
+public:
+    enum class Outcome { listening, alreadyExisted, failed };
+    using ConnectionCallback = std::function<void(std::shared_ptr<PortConnection>)>;
+
+    PortListener();
+    ~PortListener();
+    PortListener(const PortListener&) = delete;
+    PortListener& operator=(const PortListener&) = delete;
+
+    /// Removes a stale socket file of that name first. `why` is one line that names the socket, set unless
+    /// the outcome is `listening`.
+    Outcome listen(const PortDirectory& directory, const std::string& name, std::string& why);
+    /// Hands over every connection from now on, those that wait already included. A connection that the
+    /// callback does not keep is closed. The callback may close the listener, but not destroy it.
+    void acceptConnections(ConnectionCallback callback);
+    bool isListening() const { return server != nullptr; }
+    const std::string& path() const { return socketPath; }
+    /// Removes the socket file, if it is still this listener's own. Connections live on.
+    void close();
+
+private:
+    void acceptPending();
+
+    std::unique_ptr<QLocalServer> server;
+    std::optional<PortDirectory> directory;
+    std::string socketPath;
+    dev_t device = 0; // which file is this listener's own
+    ino_t inode = 0;
+    ConnectionCallback connectionCallback;
+    bool accepting = false;
+};
+
+} // namespace pelorus
