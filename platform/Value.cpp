@@ -84,6 +84,15 @@ Value& Dictionary::slotElsewhere(Label key, std::size_t& hint)
     return entries[hint].value;
 }
 
+Value& Dictionary::rewrite(std::size_t place, Label key)
+{
+    if (place == entries.size())
+        entries.push_back({key.key(), {}});
+    else if (!(entries[place].key == key.text))
+        entries[place].key = key.key();
+    return entries[place].value;
+}
+
 void Dictionary::remove(std::string_view key)
 {
     std::erase_if(entries, [key](const Entry& entry) { return entry.key == key; });

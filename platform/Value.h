@@ -139,6 +139,13 @@ public:
     void remove(std::string_view key);
     void clear() { entries.clear(); }
     void reserve(std::size_t count) { entries.reserve(count); }
+    /// The value at a place, whose key becomes `key`; `place` is at most size(). For making a dictionary anew
+    /// in the memory of an old one: no other entry may have that key when truncate() has ended it.
+    Value& rewrite(std::size_t place, Label key);
+    void truncate(std::size_t count)
+    {
+        entries.erase(entries.begin() + static_cast<std::ptrdiff_t>(count), entries.end());
+    }
     /// Adds an entry whose key is known to be absent.
     void append(Key key, Value value) { entries.push_back({std::move(key), std::move(value)}); }
     std::size_t size() const { return entries.size(); }

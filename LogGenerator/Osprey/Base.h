@@ -1,0 +1,60 @@
+#pragma once
+
+#include "LogGenerator/Osprey/CodeDictionary.h"
+#include "LogGenerator/Osprey/LogPacket.h"
+#include "platform/Value.h"
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace pelorus {
+
+/// One display section: it subscribes to log codes and turns each packet of theirs into rows of its display
+/// entry.
+///
+/// The entry belongs to the display dictionary; a section that is not bound to one decodes all the same, and
+/// what it writes goes nowhere.
+class Base {
+public:
+    virtual ~Base() = default;
+
+    /// Registers the section under its name, and as a subscriber of each of its codes.
+    void initWithDict(ClassDictionary& classDict, CodeDictionary& codeDict);
+
+    // What every section implements. On Base itself each throws std::logic_error: a programming error.
+    virtual std::string getSectionName() const;
+    virtual std::vector<LogCode> getLogCodeArray() const;
+    virtual void updateWithData(const LogPacket& data, LogCode logCode);
+
+    /// Binds the section to its display entry, a dictionary or an array.
+    void updateSectionRef(const Value& entry);
+    void updateLogCodeDict(CodeDictionary& codeDict);
+
+    static void clearElementsInArray(Array& array);
+    /// `elements` is left empty.
+    static void replaceArray(Array& array, std::vector<Value>& elements);
+
+    /// Whole decibels of a linear energy ratio with full scale at 2^19. Values at or above full scale and
+    /// values up to 705 both give 0, and 706 to 756 give -31 as the band above them: meant.
+    static std::int16_t lookUpECNO(std::uint32_t value);
+
+protected:
+    Base() = default;
+
+    /// The display entry as the kind that this section fills. One that is unbound, or bound to an entry of
+    /// the other kind, gets a fresh one that nobody sees.
+    std::shared_ptr<Dictionary> keyedEntry() const;
+    std::shared_ptr<Array> listEntry() const;
+
+private:
+    Base(const Base&) = delete;
+    Base& operator=(const Base&) = delete;
+
+    struct {
+        std::weak_ptr<Dictionary> keyed;
+        std::weak_ptr<Array> list;
+    } sectionRef;
+};
+
+} // namespace pelorus

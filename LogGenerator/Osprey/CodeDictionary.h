@@ -1,0 +1,43 @@
+#pragma once
+
+#include "LogGenerator/Osprey/LogPacket.h"
+
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace pelorus {
+
+class Base;
+
+/// Section name to section. Sections are owned by their index.
+using ClassDictionary = std::unordered_map<std::string, Base*>;
+
+/// Log code to the sections that subscribed to it, in subscription order. The keys are decimal texts
+/// ("45250", "16711681"); packets, which come by the hundred thousand, look the number up.
+class CodeDictionary {
+public:
+    using Subscribers = std::vector<Base*>;
+
+    /// The list under a decimal text, made when it is absent.
+    Subscribers& operator[](std::string_view decimalCode);
+    /// nullptr when nobody subscribed.
+    const Subscribers* find(LogCode code) const
+    {
+        for (const Entry& entry : entries)
+            if (entry.code == code)
+                return &entry.subscribers;
+        return nullptr;
+    }
+    std::vector<std::string> allKeys() const;
+
+private:
+    struct Entry {
+        LogCode code;
+        Subscribers subscribers;
+    };
+    std::vector<Entry> entries; // a few dozen at most
+};
+
+} // namespace pelorus

@@ -1,0 +1,30 @@
+#pragma once
+
+#include "LogGenerator/LogGenerator.h"
+
+namespace pelorus {
+
+/// What the generators of the Osprey family share: the raw messages since the last refresh, and the DLF file
+/// that a saved snapshot carries.
+class OSPLogGenerator : public LogGenerator {
+public:
+    /// The history, and the DLF file of everything in it. No DLF file where it cannot be made, which is
+    /// logged.
+    std::shared_ptr<Array> getSaveContentsFromState(const State& state) const override;
+    /// Nothing when an entry of the history holds something other than raw messages.
+    std::optional<Bytes> generateDlfFromState(const State& state) const;
+
+protected:
+    using LogGenerator::LogGenerator;
+
+    void keepRawMessage(std::span<const std::byte> data)
+    {
+        binData.insert(binData.end(), data.begin(), data.end());
+    }
+    /// Moves the raw messages into state["DisplayState"].
+    void handOverRawMessages(State& state);
+
+    Bytes binData; // messages as received, one behind the other
+};
+
+} // namespace pelorus

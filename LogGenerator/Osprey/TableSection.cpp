@@ -1,0 +1,72 @@
+#include "LogGenerator/Osprey/TableSection.h"
+
+#include <algorithm>
+
+namespace pelorus {
+
+std::vector<LogCode> TableSection::getLogCodeArray() const
+{
+    std::vector<LogCode> codes;
+    for (const Reading& reading : description.readings)
+        codes.push_back(reading.code);
+    return codes;
+}
+
+void TableSection::updateWithData(const LogPacket& data, LogCode logCode)
+{
+    if (systemLogListens())
+        systemLog(description.bannerPriority, "%s", description.banner);
+    const auto reading =
+        std::find_if(description.readings.begin(), description.readings.end(),
+                     [logCode](const Reading& candidate) { return candidate.code == logCode; });
+    if (reading == description.readings.end()) {
+        if (description.unknownCode == UnknownCode::logged)
+            logUnknownCode(logCode);
+        return;
+    }
+    if (!data.covers(reading->minimumLength))
+        return;
+    if (!reading->rows.empty())
+        showRows(*keyedEntry(), reading->rows, data);
+    if (reading->show)
+        reading->show(*this, data);
+}
+
+void TableSection::logUnknownCode(LogCode code)
+{
+    systemLog(kLogError, "Received an unknown log message: %d", static_cast<int>(code));
+}
+
+void TableSection::clearList()
+{
+    const std::shared_ptr<Array> list = listEntry();
+    for (Value& element : list->elements)
+        if (const auto rows = element.sharedDictionary(); rows && rows.use_count() == 2)
+            spare.push_back(std::move(element));
+    clearElementsInArray(*list);
+}
+
+void TableSection::showList(PacketView data, Records records, std::size_t count, std::span<const Row> rows)
+{
+    const std::size_t whole = data.wholeRecords(records, count);
+    buildList(whole, [&](std::size_t index, RowWriter& row) {
+        row.show(rows, data.record(records, index, whole));
+        return true;
+    });
+}
+
+void TableSection::setList(std::vector<Value> elements)
+{
+    replaceArray(*listEntry(), elements);
+}
+
+std::shared_ptr<Dictionary> TableSection::freshRows()
+{
+    if (spare.empty())
+        return makeDictionary();
+    auto rows = spare.back().sharedDictionary();
+    spare.pop_back();
+    return rows;
+}
+
+} // namespace pelorus

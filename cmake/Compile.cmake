@@ -1,0 +1,48 @@
+# How every target of the project is compiled.
+
+add_library(pelorus_compile INTERFACE)
+target_include_directories(pelorus_compile INTERFACE ${PROJECT_SOURCE_DIR})
+target_compile_options(pelorus_compile INTERFACE -Wall -Wextra -Wpedantic -Wshadow=local -Wconversion
+                                                 -Wnon-virtual-dtor -Woverloaded-virtual -fno-math-errno)
+if(CMAKE_CXX_COMPILER_ID STREQUAL "Clang")
+  target_compile_options(pelorus_compile INTERFACE -Wno-shadow)
+endif()
+if(PELORUS_WARNINGS_AS_ERRORS)
+  target_compile_options(pelorus_compile INTERFACE -Werror)
+endif()
+if(PELORUS_SANITIZE)
+  target_compile_options(pelorus_compile INTERFACE -fsanitize=${PELORUS_SANITIZE} -fno-sanitize-recover=all
+                                                   -fno-omit-frame-pointer -g)
+  target_link_options(pelorus_compile INTERFACE -fsanitize=${PELORUS_SANITIZE})
+endif()
+
+# pelorus_library(NAME LIBRARIES...): a static library of the sources in the current folder.
+function(pelorus_library name)
+  file(GLOB sources CONFIGURE_DEPENDS *.cpp)
+  if(NOT sources)
+    add_library(${name} INTERFACE)
+    return()
+  endif()
+  add_library(${name} STATIC ${sources})
+  target_link_libraries(${name} PUBLIC pelorus_compile ${ARGN})
+endfunction()
+
+# pelorus_program(NAME LIBRARIES...): a program of the sources in the current folder.
+function(pelorus_program name)
+  file(GLOB sources CONFIGURE_DEPENDS *.cpp)
+  add_executable(${name} ${sources})
+  target_link_libraries(${name} PRIVATE pelorus_compile ${ARGN})
+  install(TARGETS ${name})
+endfunction()
+
+# pelorus_test(FOLDER LIBRARIES...): the tests in one folder below tests/.
+function(pelorus_test folder)
+  file(GLOB sources CONFIGURE_DEPENDS ${folder}/*.cpp)
+  if(NOT sources)
+    return()
+  endif()
+  add_executable(test_${folder} ${sources})
+  target_link_libraries(test_${folder} PRIVATE pelorus_compile GTest::gmock_main ${ARGN})
+  set_target_properties(test_${folder} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/tests)
+  gtest_discover_tests(test_${folder} TEST_PREFIX "${folder}." DISCOVERY_TIMEOUT 120)
+endfunction()
