@@ -78,6 +78,11 @@ public:
     const bool* boolean() const { return std::get_if<bool>(&held); }
     const Date* date() const { return std::get_if<Date>(&held); }
     const std::vector<std::byte>* data() const { return pointee(std::get_if<Data>(&held)); }
+    Data sharedData() const
+    {
+        const auto* present = std::get_if<Data>(&held);
+        return present ? *present : nullptr;
+    }
     Array* array() const { return pointee(std::get_if<std::shared_ptr<Array>>(&held)); }
     Dictionary* dictionary() const { return pointee(std::get_if<std::shared_ptr<Dictionary>>(&held)); }
     std::shared_ptr<Array> sharedArray() const;

@@ -38,7 +38,12 @@ OSPLogGenerator2::~OSPLogGenerator2()
 void OSPLogGenerator2::updateState(State& state, std::span<const std::byte> data)
 {
     getDisplayFromState(state);
-    updateWithData(data);
+    try {
+        updateWithData(data);
+    } catch (...) {
+        keepRawMessage(data); // the message that ends the program is the one that its report needs
+        throw;
+    }
     keepRawMessage(data);
 }
 
