@@ -15,14 +15,12 @@ public:
     /// "-" is standard error; a file that exists is emptied. Null when the file cannot be opened; `why` is
     /// then the reason, without the file's name.
     static std::unique_ptr<FileLogSink> open(const std::string& path, std::string& why);
-    ~FileLogSink() override;
     void write(int priority, std::string_view text) override;
 
 private:
-    FileLogSink(FileDescriptor file, bool owned) : file(std::move(file)), owned(owned) {}
+    explicit FileLogSink(FileDescriptor file) : file(std::move(file)) {}
 
     FileDescriptor file;
-    bool owned;
     std::string line; // reused
 };
 

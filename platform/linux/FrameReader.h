@@ -30,7 +30,7 @@ public:
     std::size_t capacity() const { return size; }
 
 private:
-    void resize(std::size_t newSize);
+    void moveTo(std::size_t newSize);
 
     std::unique_ptr<std::byte[]> buffer;
     std::size_t size = 0;

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "platform/Platform.h"
-
-#include <memory>
+#include "platform/linux/PortDirectory.h"
+#include "platform/linux/ResourceDirectory.h"
 
 class QObject;
 
@@ -57,10 +57,12 @@ public:
     void consoleLine(std::string_view text) override;
 
 private:
+    std::optional<PortDirectory> openPortDirectory();
     /// Says once why ports cannot be used, not at each of the retries that follow.
     void reportPortTrouble(const std::string& why);
 
-    Options options;
+    ResourceDirectory resources;
+    bool console;
     std::unique_ptr<QObject> mainQueue; // what is queued or timed goes with it
     std::string reportedTrouble;
 };

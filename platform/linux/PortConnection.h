@@ -5,6 +5,7 @@
 #include <chrono>
 #include <functional>
 #include <memory>
+#include <optional>
 
 class QLocalSocket;
 
@@ -41,8 +42,8 @@ public:
     void onDrained(Callback callback, std::size_t level = 0);
 
     /// Puts a frame behind those that wait to be sent; the event loop sends them, many at a time. False, and
-    /// nothing is sent, when the connection is closed. Nothing bounds what waits but the sender: look at
-    /// unsent(), and go on in onDrained().
+    /// nothing is sent, when the connection is closed or the payload is too long. Nothing bounds what waits
+    /// but the sender: look at unsent(), and go on in onDrained().
     bool send(const Frame& frame);
     /// Answers a request; nothing is a reply without data.
     bool reply(const Frame& request, std::optional<std::span<const std::byte>> payload);
@@ -67,21 +68,24 @@ private:
     explicit PortConnection(std::unique_ptr<QLocalSocket> socket);
 
     void attach();
+    void inSignal(void (PortConnection::*handler)());
     void receive();
-    void handleReadyRead();
-    void handleBytesWritten();
-    void handleDisconnected();
-    void breakOff();
+    void handleSent();
+    void handlePeerGone();
+    void receiveLater();
+    void end();
 
     std::unique_ptr<QLocalSocket> socket;
     FrameReader reader;
-    FrameCallback frameCallback;
-    Callback closedCallback;
-    Callback drainedCallback;
+    // Shared, so that one that is running survives being replaced.
+    std::shared_ptr<FrameCallback> frameCallback;
+    std::shared_ptr<Callback> closedCallback;
+    std::shared_ptr<Callback> drainedCallback;
     std::size_t drainedLevel = 0;
     bool open = true;
+    bool peerGone = false;
     bool receiving = false;
-    int signalDepth = 0; // the socket must not be destroyed inside its own signal
+    int signalDepth = 0;
 };
 
 } // namespace pelorus

@@ -40,7 +40,7 @@ private:
     std::string socketPath;
     dev_t device = 0; // which file is this listener's own
     ino_t inode = 0;
-    ConnectionCallback connectionCallback;
+    std::shared_ptr<ConnectionCallback> connectionCallback;
     bool accepting = false;
 };
 
