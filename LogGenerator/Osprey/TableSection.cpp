@@ -37,36 +37,23 @@ void TableSection::logUnknownCode(LogCode code)
     systemLog(kLogError, "Received an unknown log message: %d", static_cast<int>(code));
 }
 
-void TableSection::clearList()
+std::shared_ptr<Array> TableSection::listRow(Label label) const
 {
-    const std::shared_ptr<Array> list = listEntry();
-    for (Value& element : list->elements)
-        if (const auto rows = element.sharedDictionary(); rows && rows.use_count() == 2)
-            spare.push_back(std::move(element));
-    clearElementsInArray(*list);
+    const auto rows = keyedEntry();
+    Value& row = rows->slot(label);
+    if (!row.array())
+        row = makeArray();
+    return row.sharedArray();
 }
 
-void TableSection::showList(PacketView data, Records records, std::size_t count, std::span<const Row> rows)
+void TableSection::showList(Array& list, PacketView data, Records records, std::size_t count,
+                            std::span<const Row> rows)
 {
     const std::size_t whole = data.wholeRecords(records, count);
-    buildList(whole, [&](std::size_t index, RowWriter& row) {
+    rewriter.rewriteRows(list, whole, [&](std::size_t index, RowWriter& row) {
         row.show(rows, data.record(records, index, whole));
         return true;
     });
-}
-
-void TableSection::setList(std::vector<Value> elements)
-{
-    replaceArray(*listEntry(), elements);
-}
-
-std::shared_ptr<Dictionary> TableSection::freshRows()
-{
-    if (spare.empty())
-        return makeDictionary();
-    auto rows = spare.back().sharedDictionary();
-    spare.pop_back();
-    return rows;
 }
 
 } // namespace pelorus

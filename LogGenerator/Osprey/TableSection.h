@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Osprey/Base.h"
+#include "LogGenerator/Osprey/ListRewriter.h"
 #include "LogGenerator/Osprey/Row.h"
 #include "platform/SystemLog.h"
 
@@ -43,36 +44,33 @@ public:
     // For the readings' functions.
 
     std::shared_ptr<Dictionary> entry() const { return keyedEntry(); }
-    void clearList();
+    /// The list that a row of the keyed entry holds; it is made where the row has none.
+    std::shared_ptr<Array> listRow(Label label) const;
+
+    void clearList() { rewriter.clear(*listEntry()); }
     /// Shows one dictionary of rows for each of the `count` records that lies wholly inside the packet.
-    void showList(PacketView data, Records records, std::size_t count, std::span<const Row> rows);
+    void showList(PacketView data, Records records, std::size_t count, std::span<const Row> rows)
+    {
+        showList(*listEntry(), data, records, count, rows);
+    }
+    void showList(Array& list, PacketView data, Records records, std::size_t count,
+                  std::span<const Row> rows);
     /// Shows `count` dictionaries; `fill(index, rows)` writes the rows of each and says whether it is kept.
-    template <class Fill> void buildList(std::size_t count, Fill fill);
-    /// Replaces the list by what `elements` holds.
-    void setList(std::vector<Value> elements);
+    template <class Fill> void buildList(std::size_t count, Fill fill)
+    {
+        rewriter.rewriteRows(*listEntry(), count, fill);
+    }
+    /// Makes `list` one of `count` texts; `fill(index, text)` writes each.
+    template <class Fill> void buildTexts(Array& list, std::size_t count, Fill fill)
+    {
+        rewriter.rewriteTexts(list, count, fill);
+    }
 
     static void logUnknownCode(LogCode code);
 
 private:
-    std::shared_ptr<Dictionary> freshRows();
-
     const SectionDescription& description;
-    std::vector<Value> spare;       // row dictionaries that the display let go of
-    std::vector<Value> newElements; // kept for its memory
+    ListRewriter rewriter;
 };
-
-template <class Fill> void TableSection::buildList(std::size_t count, Fill fill)
-{
-    clearList();
-    newElements.clear();
-    for (std::size_t index = 0; index < count; ++index) {
-        std::shared_ptr<Dictionary> dictionary = freshRows();
-        RowWriter rows(*dictionary);
-        if (fill(index, rows))
-            newElements.emplace_back(std::move(dictionary));
-    }
-    if (count > 0)
-        replaceArray(*listEntry(), newElements);
-}
 
 } // namespace pelorus
