@@ -53,7 +53,7 @@ Value Dictionary::at(std::string_view key) const
     return found ? *found : Value();
 }
 
-void Dictionary::set(std::string_view key, Value value)
+void Dictionary::setText(std::string_view key, Value value)
 {
     if (Value* present = find(key))
         *present = std::move(value);

@@ -1,12 +1,15 @@
 #pragma once
 
 #include <chrono>
+#include <concepts>
 #include <cstddef>
 #include <cstdint>
 #include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <type_traits>
+#include <utility>
 #include <variant>
 #include <vector>
 
@@ -130,7 +133,13 @@ public:
     Value at(std::string_view key) const;
     void set(const Key& key, Value value) { slot(key) = std::move(value); }
     void set(Label key, Value value) { slot(key) = std::move(value); }
-    void set(std::string_view key, Value value);
+    /// Text from outside; a literal is a label.
+    template <class Text>
+    requires(std::convertible_to<const Text&, std::string_view> &&
+             !std::is_array_v<Text>) void set(const Text& key, Value value)
+    {
+        setText(key, std::move(value));
+    }
     /// Where the value under a key is; a nil to be filled at once when the key was absent.
     Value& slot(const Key& key);
     Value& slot(Label key);
@@ -159,6 +168,7 @@ public:
     auto end() const { return entries.end(); }
 
 private:
+    void setText(std::string_view key, Value value);
     Value& slotElsewhere(Label key, std::size_t& hint);
     std::vector<Entry> entries;
 };
