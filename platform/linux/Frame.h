@@ -15,7 +15,7 @@ struct Frame {
     std::int32_t id = 0;
     FrameKind kind = FrameKind::oneWay;
     std::uint32_t sequence = 0; // a reply repeats its request's
-    std::span<const std::byte> payload;
+    std::span<const std::byte> payload = {};
     bool hasData = true; // false only for a reply that carries none, which is not the same as an empty one
 };
 
