@@ -37,8 +37,9 @@ OSPLogGenerator2::~OSPLogGenerator2()
 
 void OSPLogGenerator2::updateState(State& state, std::span<const std::byte> data)
 {
-    getDisplayFromState(state);
+    takeOver(state);
     try {
+        getDisplayFromState(state);
         updateWithData(data);
     } catch (...) {
         keepRawMessage(data); // the message that ends the program is the one that its report needs
@@ -70,7 +71,6 @@ void OSPLogGenerator2::updateWithData(std::span<const std::byte> data)
 
 Value OSPLogGenerator2::getDisplayFromState(State& state)
 {
-    takeOver(state);
     if (const Value* display = state.find("Display"))
         return *display;
     Value pattern = state.at("Template");
@@ -84,7 +84,8 @@ Value OSPLogGenerator2::getDisplayFromState(State& state)
     }
     systemLog(kLogWarning, "Initialized class index: %p, Self: %p", static_cast<const void*>(cIndex.get()),
               static_cast<const void*>(this));
-    cIndex->status();
+    if (cIndex)
+        cIndex->status();
     const Value display = processTemplate(pattern);
     printDict(display);
     state.set(Label("Display"), display);
@@ -106,14 +107,17 @@ void OSPLogGenerator2::bindSections(const Value& display)
     if (const Array* array = display.array())
         for (const Value& element : array->elements)
             bindSections(element);
-    const Dictionary* dictionary = display.dictionary();
-    if (!dictionary || !cIndex)
-        return;
-    for (const auto& [key, value] : *dictionary) {
-        bindSections(value);
-        if (Base* section = cIndex->getClass(std::string(key.text())))
-            section->updateSectionRef(value);
-    }
+    if (const Dictionary* dictionary = display.dictionary())
+        for (const auto& [key, value] : *dictionary) {
+            bindSections(value);
+            bindSection(key, value);
+        }
+}
+
+void OSPLogGenerator2::bindSection(const Key& name, const Value& entry)
+{
+    if (Base* section = cIndex ? cIndex->getClass(std::string(name.text())) : nullptr)
+        section->updateSectionRef(entry);
 }
 
 Value OSPLogGenerator2::loadTemplate()
@@ -140,8 +144,7 @@ Value OSPLogGenerator2::processTemplate(const Value& object)
         auto copy = makeDictionary();
         for (const auto& [key, pattern] : *dictionary) {
             const Value value = processTemplate(pattern);
-            if (Base* section = cIndex->getClass(std::string(key.text())))
-                section->updateSectionRef(value);
+            bindSection(key, value);
             copy->append(key, value);
         }
         return copy;
@@ -168,6 +171,7 @@ void OSPLogGenerator2::printDict(const Value& object)
 
 Value OSPLogGenerator2::generateLogUsingState(State& state)
 {
+    takeOver(state);
     Value display = getDisplayFromState(state);
     handOverRawMessages(state);
     updateHistoryInState(platform, state);

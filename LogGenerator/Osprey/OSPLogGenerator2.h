@@ -40,8 +40,10 @@ protected:
     std::string pListName;
 
 private:
+    /// Before this generator's first use of a state that others may have used.
     void takeOver(State& state);
     void bindSections(const Value& display);
+    void bindSection(const Key& name, const Value& entry);
     Value loadTemplate();
 
     bool tookOver = false;
