@@ -205,10 +205,9 @@ void PelorusModel::announceConnection()
 
 void PelorusModel::updateWithData(std::span<const std::byte> data)
 {
-    decoding = true;
+    unrecorded = true; // at once: the message that ends the program counts too
     if (logGenerator)
         logGenerator->updateState(*state, data);
-    decoding = false;
     updated = true;
 }
 
@@ -233,10 +232,17 @@ std::shared_ptr<const PelorusModelNode> PelorusModel::topLevelNodes()
 {
     if (nodes || !logGenerator)
         return nodes;
-    const Value display = logGenerator->generateLogUsingState(*state);
+    const Value display = recordDisplay();
     nodesByPath = std::make_unique<PathDictionary>();
     nodes = PelorusModelNode::makeTreeFromObject(display, *nodesByPath);
     return nodes;
+}
+
+Value PelorusModel::recordDisplay()
+{
+    Value display = logGenerator->generateLogUsingState(*state);
+    unrecorded = false;
+    return display;
 }
 
 std::shared_ptr<const PelorusModelNode> PelorusModel::nodeAtPath(const std::string& path)
@@ -256,9 +262,21 @@ std::shared_ptr<Array> PelorusModel::getSaveContents() const
 
 void PelorusModel::writeRecoverySnapshot(std::string_view exceptionName)
 {
-    if (logGenerator && (updated || decoding))
-        logGenerator->generateLogUsingState(*state);
-    writeSnapshotFile(platform, snapshotFileContent(dateText(platform.now()), getSaveContents(),
+    if (logGenerator && unrecorded) {
+        try {
+            recordDisplay();
+        } catch (const std::exception& exception) { // perhaps the one that ends the program, once more
+            systemLog(kLogError, "The last messages are not in the recovered snapshot: %s",
+                      std::string(exception.what()));
+        }
+    }
+    std::shared_ptr<Array> contents = getSaveContents();
+    if (!contents) {
+        contents = makeArray();
+        if (const Value history = state->at("History"); history.array())
+            contents->elements = history.array()->elements;
+    }
+    writeSnapshotFile(platform, snapshotFileContent(dateText(platform.now()), contents,
                                                     "Recovered after " + std::string(exceptionName)));
 }
 

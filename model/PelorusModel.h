@@ -56,6 +56,7 @@ private:
     bool openChannel();
     bool sendStartCommand();
     void announceConnection();
+    Value recordDisplay();
 
     Platform& platform;
     PelorusModelObserver& observer;
@@ -63,7 +64,7 @@ private:
     std::shared_ptr<MessagePort> sendPort;
     std::unique_ptr<RepeatingTimer> displayUpdateTimer; // set: the monitor has started
     bool updated = false;
-    bool decoding = false;
+    bool unrecorded = false; // messages arrived that no history entry holds
     bool announcedConnection = false;
     std::unique_ptr<LogGenerator> logGenerator;
     std::shared_ptr<State> state = std::make_shared<State>();
