@@ -1,0 +1,13 @@
+#pragma once
+
+#include "LogGenerator/Osprey/TableSection.h"
+
+namespace pelorus {
+
+/// State of the registration and of packet-switched mobility management.
+class ProcessPS : public TableSection {
+public:
+    ProcessPS();
+};
+
+} // namespace pelorus
