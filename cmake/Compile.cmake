@@ -2,6 +2,7 @@
 
 add_library(pelorus_compile INTERFACE)
 target_include_directories(pelorus_compile INTERFACE ${PROJECT_SOURCE_DIR})
+target_compile_definitions(pelorus_compile INTERFACE QT_NO_KEYWORDS)
 target_compile_options(pelorus_compile INTERFACE -Wall -Wextra -Wpedantic -Wshadow=local -Wconversion
                                                  -Wnon-virtual-dtor -Woverloaded-virtual -fno-math-errno)
 if(CMAKE_CXX_COMPILER_ID STREQUAL "Clang")

@@ -41,9 +41,7 @@ private:
     Node child(std::string_view name, const Value& object)
     {
         const std::size_t parentLength = path.size();
-        if (path != "/")
-            path += '/';
-        path += name;
+        appendPathComponent(path, name);
         Node node = build(name, object);
         path.resize(parentLength);
         return node;
@@ -53,20 +51,28 @@ private:
     {
         PelorusModelNodes children;
         children.reserve(dictionary.size());
-        if (!dictionary.find(kSorted)) {
+        if (!isSorted(dictionary)) {
             for (const auto& [key, value] : dictionary)
-                children.push_back(child(key.text(), value));
+                if (value)
+                    children.push_back(child(key.text(), value));
             return children;
         }
         std::vector<const Dictionary::Entry*> entries;
         for (const auto& entry : dictionary)
-            if (!(entry.key == kSorted))
+            if (entry.value && !(entry.key == kSorted))
                 entries.push_back(&entry);
         std::sort(entries.begin(), entries.end(),
                   [](const auto* a, const auto* b) { return a->key.text() < b->key.text(); });
         for (const auto* entry : entries)
             children.push_back(child(shownName(entry->key.text()), entry->value));
         return children;
+    }
+
+    /// Only that there is a mark counts, not what it says.
+    static bool isSorted(const Dictionary& dictionary)
+    {
+        const Value* mark = dictionary.find(kSorted);
+        return mark && *mark;
     }
 
     /// Of a sorted dictionary's key that has exactly one semicolon, what stands behind it.
@@ -96,6 +102,13 @@ private:
 };
 
 } // namespace
+
+void appendPathComponent(std::string& path, std::string_view name)
+{
+    if (path != "/")
+        path += '/';
+    path += name;
+}
 
 std::shared_ptr<const PelorusModelNode> PelorusModelNode::makeTreeFromObject(const Value& object,
                                                                              PathDictionary& paths)

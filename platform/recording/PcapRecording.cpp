@@ -1,5 +1,6 @@
 #include "platform/recording/PcapRecording.h"
 
+#include <algorithm>
 #include <array>
 #include <fmt/format.h>
 #include <pcap/pcap.h>
@@ -11,6 +12,7 @@ namespace {
 
 constexpr int kLinkType = DLT_USER0;
 static_assert(kLinkType == 147);
+constexpr time_t kLatestSecond = 8'000'000'000;
 
 std::string withoutName(std::string_view text, const std::string& path)
 {
@@ -65,8 +67,9 @@ RecordingReader::Next PcapRecording::next(RecordedMessage& message)
         return Next::failed;
     }
     ++messages;
-    message.time =
-        RecordedTime(std::chrono::seconds(header->ts.tv_sec) + std::chrono::nanoseconds(header->ts.tv_usec));
+    // pcapng can tell times that 64 bits of nanoseconds cannot.
+    message.time = RecordedTime(std::chrono::seconds(std::clamp<time_t>(header->ts.tv_sec, 0, kLatestSecond)) +
+                                std::chrono::nanoseconds(header->ts.tv_usec));
     message.bytes = std::as_bytes(std::span(bytes, header->caplen));
     return Next::message;
 }

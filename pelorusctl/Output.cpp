@@ -1,0 +1,40 @@
+#include "pelorusctl/Output.h"
+
+#include <cerrno>
+#include <cstdio>
+#include <cstring>
+#include <filesystem>
+#include <fmt/format.h>
+
+namespace pelorus {
+
+namespace {
+
+int outputError = 0;
+
+} // namespace
+
+void print(std::string_view text)
+{
+    if (std::fwrite(text.data(), 1, text.size(), stdout) != text.size() || std::fflush(stdout) != 0)
+        outputError = errno;
+}
+
+int finishOutput(int status)
+{
+    return outputError ? fail("standard output", std::strerror(outputError)) : status;
+}
+
+int fail(std::string_view name, std::string_view why)
+{
+    fmt::print(stderr, "pelorusctl: {}: {}\n", name, why);
+    return kUnreadable;
+}
+
+bool isDirectory(const std::string& path)
+{
+    std::error_code none;
+    return std::filesystem::is_directory(path, none);
+}
+
+} // namespace pelorus
