@@ -15,7 +15,7 @@ class LinuxPlatform : public Platform {
 public:
     struct Options {
         /// Where property-list resources are; empty: beside the program.
-        std::string resourceDirectory;
+        std::string resourceDirectory = {};
         /// False: console lines are dropped.
         bool console = true;
     };

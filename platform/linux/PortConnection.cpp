@@ -103,6 +103,12 @@ void PortConnection::inSignal(void (PortConnection::*handler)())
         --signalDepth; // else the connection ends here, inside the signal
 }
 
+/// Whether anybody but the running handlers still refers to the connection.
+bool PortConnection::isHeld() const
+{
+    return weak_from_this().use_count() > signalDepth;
+}
+
 void PortConnection::receiveLater()
 {
     QTimer::singleShot(0, socket.get(), [this] { inSignal(&PortConnection::receive); });
@@ -113,7 +119,7 @@ void PortConnection::receive()
     if (receiving)
         return; // a frame callback waits: its frame's payload must stay where it is
     receiving = true;
-    while (open && frameCallback && (peerGone || unsent() <= kReadWhileUnsent)) {
+    while (open && isHeld() && frameCallback && (peerGone || unsent() <= kReadWhileUnsent)) {
         if (const auto frame = reader.next()) {
             const auto callback = frameCallback;
             callAtBoundary(*callback, *this, *frame);
@@ -131,7 +137,7 @@ void PortConnection::receive()
         reader.received(static_cast<std::size_t>(count));
     }
     receiving = false;
-    if (open && peerGone && frameCallback)
+    if (open && isHeld() && peerGone && frameCallback)
         end();
 }
 

@@ -69,6 +69,7 @@ private:
 
     void attach();
     void inSignal(void (PortConnection::*handler)());
+    bool isHeld() const;
     void receive();
     void handleSent();
     void handlePeerGone();
