@@ -1,0 +1,46 @@
+#include "platform/PropertyListGuard.h"
+
+#include <fmt/format.h>
+
+namespace pelorus {
+
+bool PropertyListBudget::takeValue(std::string& why)
+{
+    if (values == 0) {
+        why = fmt::format("the property list holds more than {} values", PropertyListLimits::values);
+        return false;
+    }
+    --values;
+    return true;
+}
+
+bool PropertyListBudget::takeBytes(std::uint64_t count, std::string& why)
+{
+    if (count > bytes) {
+        why = fmt::format("the property list holds more than {} bytes of text and data",
+                          PropertyListLimits::bytes);
+        return false;
+    }
+    bytes -= count;
+    return true;
+}
+
+bool PropertyListBudget::takeSteps(std::uint64_t count, std::string& why)
+{
+    if (count > steps) {
+        why = "the XML property list has too many keys in one dictionary or entities in one text";
+        return false;
+    }
+    steps -= count;
+    return true;
+}
+
+bool PropertyListBudget::allowsDepth(std::size_t containers, std::string& why)
+{
+    if (containers <= PropertyListLimits::depth)
+        return true;
+    why = fmt::format("the property list nests deeper than {} containers", PropertyListLimits::depth);
+    return false;
+}
+
+} // namespace pelorus
