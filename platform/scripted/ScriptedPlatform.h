@@ -20,9 +20,9 @@ public:
 
 /// What a send looked like.
 struct SentMessage {
-    std::string port;
+    std::string port = {};
     std::int32_t id = 0;
-    Bytes payload;
+    Bytes payload = {};
     Seconds sendTimeout{0};
     Seconds receiveTimeout{0};
     std::chrono::nanoseconds when{0}; // on the virtual clock

@@ -2,7 +2,10 @@
 
 #include <QCoreApplication>
 #include <QTimer>
+#include <atomic>
 #include <chrono>
+#include <string>
+#include <thread>
 
 namespace pelorus::test {
 
@@ -27,6 +30,20 @@ inline void spinOnce()
     bool done = false;
     QTimer::singleShot(20, Qt::PreciseTimer, QCoreApplication::instance(), [&done] { done = true; });
     spinUntil([&done] { return done; });
+}
+
+/// What a peer receives while the event loop runs.
+template <class Peer> std::string receiveFrom(const Peer& peer, std::size_t length)
+{
+    std::atomic<bool> done = false;
+    std::string received;
+    std::thread reader([&] {
+        received = peer.receive(length);
+        done = true;
+    });
+    spinUntil([&] { return done.load(); }, std::chrono::minutes(1));
+    reader.join();
+    return received;
 }
 
 } // namespace pelorus::test

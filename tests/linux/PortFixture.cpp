@@ -2,6 +2,7 @@
 
 #include <cstring>
 #include <sys/socket.h>
+#include <sys/time.h>
 #include <sys/un.h>
 
 namespace pelorus::test {
@@ -38,6 +39,12 @@ std::string wireFrame(std::uint32_t length, std::int32_t id, std::uint32_t kind,
 std::string oneWay(std::string_view payload, std::int32_t id)
 {
     return wireFrame(static_cast<std::uint32_t>(payload.size()), id, 0, 0, payload);
+}
+
+RawPeer::RawPeer(int descriptor) : socket(descriptor)
+{
+    const timeval limit = {30, 0}; // a test that fails must not hang
+    ::setsockopt(descriptor, SOL_SOCKET, SO_RCVTIMEO, &limit, sizeof limit);
 }
 
 RawPeer RawPeer::connectTo(const std::string& path)

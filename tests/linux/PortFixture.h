@@ -36,7 +36,7 @@ std::string oneWay(std::string_view payload, std::int32_t id = 0);
 class RawPeer {
 public:
     RawPeer() = default;
-    explicit RawPeer(int descriptor) : socket(descriptor) {}
+    explicit RawPeer(int descriptor);
     static RawPeer connectTo(const std::string& path);
 
     bool isConnected() const { return bool(socket); }
