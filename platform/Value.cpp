@@ -76,19 +76,23 @@ Value& Dictionary::slot(Label key)
 
 Value& Dictionary::slotElsewhere(Label key, std::size_t& hint)
 {
-    const auto found = std::find_if(entries.begin(), entries.end(),
-                                    [key](const Entry& entry) { return entry.key == key.text; });
+    const auto holds = [key](const Entry& entry) { return entry.key == key.text; };
+    const bool guessed = hint < entries.size() && holds(entries[hint]);
+    const auto found = guessed ? entries.begin() + static_cast<std::ptrdiff_t>(hint)
+                               : std::find_if(entries.begin(), entries.end(), holds);
     hint = static_cast<std::size_t>(found - entries.begin());
     if (found == entries.end())
         entries.push_back({key.key(), {}});
+    else
+        found->key = key.key(); // found by its address the next time
     return entries[hint].value;
 }
 
-Value& Dictionary::rewrite(std::size_t place, Label key)
+Value& Dictionary::rewriteOther(std::size_t place, Label key)
 {
     if (place == entries.size())
         entries.push_back({key.key(), {}});
-    else if (!(entries[place].key == key.text))
+    else
         entries[place].key = key.key();
     return entries[place].value;
 }

@@ -28,6 +28,12 @@ public:
         return a.view.size() == b.size() && (a.view.data() == b.data() || a.view == b);
     }
 
+    /// Whether it is that very literal, which an equal text from elsewhere is not.
+    constexpr bool is(std::string_view literal) const
+    {
+        return view.data() == literal.data() && view.size() == literal.size();
+    }
+
 private:
     struct Literal {};
     constexpr Key(Literal, std::string_view literal) : view(literal) {}
@@ -146,7 +152,7 @@ public:
     /// As slot(), looking first where the key was found the last time.
     Value& slot(Label key, std::size_t& hint)
     {
-        if (hint < entries.size() && entries[hint].key == key.text) [[likely]]
+        if (hint < entries.size() && entries[hint].key.is(key.text)) [[likely]]
             return entries[hint].value;
         return slotElsewhere(key, hint);
     }
@@ -155,7 +161,12 @@ public:
     void reserve(std::size_t count) { entries.reserve(count); }
     /// The value at a place, whose key becomes `key`; `place` is at most size(). For making a dictionary anew
     /// in the memory of an old one: no other entry may have that key when truncate() has ended it.
-    Value& rewrite(std::size_t place, Label key);
+    Value& rewrite(std::size_t place, Label key)
+    {
+        if (place < entries.size() && entries[place].key.is(key.text)) [[likely]]
+            return entries[place].value;
+        return rewriteOther(place, key);
+    }
     void truncate(std::size_t count)
     {
         entries.erase(entries.begin() + static_cast<std::ptrdiff_t>(count), entries.end());
@@ -170,6 +181,7 @@ public:
 private:
     void setText(std::string_view key, Value value);
     Value& slotElsewhere(Label key, std::size_t& hint);
+    Value& rewriteOther(std::size_t place, Label key);
     std::vector<Entry> entries;
 };
 

@@ -1,13 +1,16 @@
 #pragma once
 
+#include <algorithm>
+#include <array>
 #include <cstdint>
 #include <string>
 #include <string_view>
 
 namespace pelorus {
 
-/// A printf text with one conversion, taken apart when the program is compiled so that writing a row costs no
-/// parsing. Of the conversions it knows those that rows use: "%d", "%u", "%4.2f" and "%f".
+/// A printf text with one conversion, taken apart when the program is compiled so that
+/// writing a row costs no parsing. Of the conversions it knows those that rows use: "%d", "%u", "%4.2f" and
+/// "%f".
 class Format {
 public:
     // NOLINTNEXTLINE(google-explicit-constructor): tables read better with the bare printf text
@@ -24,6 +27,20 @@ public:
     void writeFixed(std::string& out, std::int64_t value) const;
 
 private:
+    static constexpr std::size_t kRoom = 16;
+    struct Affix {
+        std::array<char, kRoom> text{}; // copied whole, which is cheaper than counting
+        std::size_t length = 0;
+
+        consteval void set(std::string_view given)
+        {
+            if (given.size() > kRoom)
+                throw "a text that is too long";
+            std::copy(given.begin(), given.end(), text.begin());
+            length = given.size();
+        }
+    };
+
     consteval explicit Format(std::string_view text)
     {
         const std::size_t percent = text.find('%');
@@ -33,15 +50,16 @@ private:
             throw "a conversion that rows do not use";
         isUnsigned = conversion == "%u";
         hasSixDecimals = conversion == "%f";
-        prefix = text.substr(0, percent);
-        suffix = text.substr(end);
+        prefix.set(text.substr(0, percent));
+        suffix.set(text.substr(end));
     }
 
-    void finish(std::string& out, const char* digits, std::size_t count) const;
-
-    std::string_view prefix, suffix;
+    Affix prefix;
+    Affix suffix;
     bool isUnsigned = false;
     bool hasSixDecimals = false;
+
+    class Text;
 };
 
 } // namespace pelorus

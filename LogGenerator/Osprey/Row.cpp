@@ -5,10 +5,11 @@ namespace pelorus {
 bool writeRow(const Row& row, PacketView data, Value& out)
 {
     const std::int64_t raw = data[row.field];
-    if (const std::string_view text = row.texts.at(raw); !text.empty()) {
-        out.text().assign(text);
-        return true;
-    }
+    if (!row.texts.empty())
+        if (const std::string_view text = row.texts.at(raw); !text.empty()) {
+            out.text().assign(text);
+            return true;
+        }
     switch (row.kind) {
     case Row::Kind::number:
         row.format.write(out.text(), raw * row.scale + row.offset);

@@ -23,6 +23,7 @@ public:
     template <std::size_t N> constexpr TextTable(const ValueText (&texts)[N]) : scattered(texts) {}  // NOLINT
     constexpr TextTable() = default;
 
+    constexpr bool empty() const { return run.empty() && scattered.empty(); }
     /// Empty for a value that the table does not list.
     constexpr std::string_view at(std::int64_t value) const
     {
