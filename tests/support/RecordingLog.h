@@ -2,6 +2,7 @@
 
 #include "platform/SystemLog.h"
 
+#include <fmt/format.h>
 #include <string>
 #include <utility>
 #include <vector>
@@ -18,7 +19,7 @@ public:
 
     void write(int priority, std::string_view text) override
     {
-        lines.push_back("<" + std::to_string(priority) + ">" + std::string(text));
+        lines.push_back(fmt::format("<{}>{}", priority, text));
     }
 
     /// "<3>text" of every line since the last take().
