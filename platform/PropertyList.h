@@ -15,12 +15,12 @@ enum class PropertyListForm { xml, binary };
 /// Bounds that no honest list reaches and no hostile one may pass.
 struct PropertyListLimits {
     static constexpr std::size_t input = 256 * 1024 * 1024;
-    static constexpr std::size_t depth = 256;        // containers within containers
-    static constexpr std::size_t values = 1'000'000; // keys included, after shared references are expanded
+    static constexpr std::size_t depth = 256;      // containers within containers
+    static constexpr std::size_t values = 250'000; // keys included, after shared references are expanded
     static constexpr std::size_t bytes = 64 * 1024 * 1024; // of text and data, after expansion
     /// Steps of the two things whose cost libplist lets grow with the square of a list's size, both in XML:
-    /// the keys of one dictionary, some 18,000 of which are allowed, and the entities of one text, where a
-    /// megabyte may be all entities. Ten nanoseconds or so each.
+    /// the keys of one dictionary, some 18,000 of which are allowed, and the entities of one text, half a
+    /// megabyte of which may be nothing else. Ten nanoseconds or so each.
     static constexpr std::uint64_t steps = 200'000'000;
 };
 
@@ -33,10 +33,10 @@ struct PropertyListLimits {
 Value parsePropertyList(std::span<const std::byte> bytes, std::string* why = nullptr);
 
 /// Nothing when the value is nil or holds a nil somewhere, nests deeper than the limit (so also when a
-/// container holds itself), or holds a date outside the years 0 to 9999. parsePropertyList() reads the value
-/// back equal, with these exceptions: XML dates have whole seconds and lose the fraction; NUL and bytes that
-/// are not UTF-8, which property lists cannot hold, are written as U+FFFD; a NaN is equal to nothing. Control
-/// characters are written as they are.
+/// container holds itself), or holds a date outside the years 0 to 9999. Within its limits
+/// parsePropertyList() reads the value back equal, with these exceptions: XML dates have whole seconds and
+/// lose the fraction; NUL and bytes that are not UTF-8, which property lists cannot hold, are written as
+/// U+FFFD; a NaN is equal to nothing. Control characters are written as they are.
 std::optional<std::vector<std::byte>> serializePropertyList(const Value& value,
                                                             PropertyListForm form = PropertyListForm::xml);
 

@@ -1,5 +1,6 @@
 #include "platform/PropertyListGuard.h"
 #include "platform/XmlPropertyListText.h"
+#include "platform/XmlScanner.h"
 
 #include <fmt/format.h>
 
@@ -11,19 +12,15 @@ namespace {
 
 using namespace std::literals;
 
-/// A strict scanner. Where libplist's own reading and XML differ, neither is taken: the text is refused.
+/// Stricter than XML: where libplist's own reading and XML differ, neither is taken but the text is refused.
 class XmlPropertyListGuard {
 public:
-    XmlPropertyListGuard(std::string_view text, std::string& why) : text(text), why(why) {}
+    XmlPropertyListGuard(std::string_view text, std::string& why) : scanner(text), why(why) {}
 
     std::optional<std::string_view> rootElement();
 
 private:
-    struct Tag {
-        std::string_view name;
-        bool closing;
-        bool empty;
-    };
+    using Tag = XmlScanner::Tag;
 
     struct Container {
         bool dictionary;
@@ -40,13 +37,8 @@ private:
         return false;
     }
     bool endsEarly();
-    std::string_view rest() const { return text.substr(position); }
-    bool at(std::string_view start) const { return rest().starts_with(start); }
-    bool passBehind(std::string_view end);
-    void passSpace();
-    bool passSpaceAndComments();
+    bool passSpaceAndComments() { return scanner.passSpaceAndComments() || endsEarly(); }
     bool passProlog();
-    bool passDocumentType();
     bool openWrapper(bool& wrapped);
     bool passTrailer(bool wrapped);
     bool readTag(Tag& tag);
@@ -58,9 +50,8 @@ private:
     bool passTextPart(std::string_view part);
     bool passEndOf(std::string_view name);
 
-    std::string_view text;
+    XmlScanner scanner;
     std::string& why;
-    std::size_t position = 0;
     PropertyListBudget budget;
     std::size_t depth = 0;
     std::string_view scalar; // the element whose text is being read
@@ -70,14 +61,13 @@ private:
 std::optional<std::string_view> XmlPropertyListGuard::rootElement()
 {
     bool wrapped = false;
-    if (at("\xEF\xBB\xBF"))
-        position = 3;
+    scanner.pass("\xEF\xBB\xBF"); // the byte order mark
     if (!passProlog() || !openWrapper(wrapped) || !passSpaceAndComments())
         return std::nullopt;
-    const std::size_t start = position;
+    const std::size_t start = scanner.position();
     if (!passRootElement())
         return std::nullopt;
-    const std::string_view root = text.substr(start, position - start);
+    const std::string_view root = scanner.since(start);
     if (!passTrailer(wrapped))
         return std::nullopt;
     if (root.find('\0') != std::string_view::npos) {
@@ -96,44 +86,22 @@ bool XmlPropertyListGuard::endsEarly()
     return refuse("the XML property list ends before its value does");
 }
 
-bool XmlPropertyListGuard::passBehind(std::string_view end)
-{
-    const std::size_t found = text.find(end, position);
-    if (found == std::string_view::npos)
-        return endsEarly();
-    position = found + end.size();
-    return true;
-}
-
-void XmlPropertyListGuard::passSpace()
-{
-    while (position < text.size() && isXmlSpace(text[position]))
-        ++position;
-}
-
-bool XmlPropertyListGuard::passSpaceAndComments()
-{
-    for (passSpace(); at("<!--"); passSpace()) {
-        position += 4;
-        if (!passBehind("-->"))
-            return false;
-    }
-    return true;
-}
-
 bool XmlPropertyListGuard::passProlog()
 {
     while (passSpaceAndComments()) {
-        if (at("<?")) {
-            const std::size_t start = position;
-            if (!passBehind("?>"))
-                return false;
-            const std::string_view instruction = text.substr(start, position - start);
+        const std::size_t start = scanner.position();
+        if (scanner.at("<?")) {
+            if (!scanner.passBehind("?>"))
+                return endsEarly();
+            const std::string_view instruction = scanner.since(start);
             if (instruction.starts_with("<?xml ") && !declaresUtf8(instruction))
                 return refuse("the XML property list is not in UTF-8");
-        } else if (at("<!DOCTYPE")) {
-            if (!passDocumentType())
-                return false;
+        } else if (scanner.at("<!DOCTYPE")) {
+            const XmlScanner::Outcome outcome = scanner.passDocumentType();
+            if (outcome == XmlScanner::Outcome::ended)
+                return endsEarly();
+            if (outcome == XmlScanner::Outcome::malformed)
+                return refuse("the XML property list has document type declarations of its own");
         } else {
             return true;
         }
@@ -141,42 +109,17 @@ bool XmlPropertyListGuard::passProlog()
     return false;
 }
 
-bool XmlPropertyListGuard::passDocumentType()
-{
-    char quote = 0;
-    for (; position < text.size(); ++position) {
-        const char c = text[position];
-        if (quote != 0) {
-            if (c == quote)
-                quote = 0;
-        } else if (c == '"' || c == '\'') {
-            quote = c;
-        } else if (c == '[') {
-            return refuse("the XML property list has document type declarations of its own");
-        } else if (c == '>') {
-            ++position;
-            return true;
-        }
-    }
-    return endsEarly();
-}
-
 bool XmlPropertyListGuard::openWrapper(bool& wrapped)
 {
-    constexpr std::string_view start = "<plist";
-    wrapped = at(start);
+    wrapped = scanner.pass("<plist");
     if (!wrapped)
         return true;
-    position += start.size();
-    const std::size_t end = text.find_first_of("<>", position);
-    if (end == std::string_view::npos)
+    const auto attributes = scanner.passUntil("<>");
+    if (!attributes)
         return endsEarly();
-    const std::string_view attributes = text.substr(position, end - position);
-    if (text[end] != '>' ||
-        (!attributes.empty() && (!isXmlSpace(attributes.front()) || attributes.back() == '/')))
+    if (!attributes->empty() && (!isXmlSpace(attributes->front()) || attributes->back() == '/'))
         return refuse("the XML property list has a malformed <plist>");
-    position = end + 1;
-    return true;
+    return scanner.pass(">") || refuse("the XML property list has a malformed <plist>");
 }
 
 /// Behind the list only comments may follow, and NULs, which those that send texts with their terminator add.
@@ -186,47 +129,37 @@ bool XmlPropertyListGuard::passTrailer(bool wrapped)
     if (wrapped) {
         if (!passSpaceAndComments())
             return false;
-        if (position == text.size())
+        if (scanner.ended())
             return refuse("the XML property list ends inside <plist>");
-        if (!at("</plist"))
+        if (!scanner.at("</plist"))
             return refuse("the XML property list holds more than one value");
         if (!readTag(tag))
             return false;
     }
     while (passSpaceAndComments()) {
-        if (position == text.size())
+        if (scanner.ended())
             return true;
-        if (text[position] != '\0')
+        if (!scanner.pass("\0"sv))
             return refuse("something follows the XML property list");
-        ++position;
     }
     return false;
 }
 
 bool XmlPropertyListGuard::readTag(Tag& tag)
 {
-    if (position == text.size())
+    if (scanner.ended())
         return endsEarly();
-    if (text[position] != '<')
+    if (!scanner.at("<"))
         return refuse(depth > 0 ? fmt::format("the XML property list has text between the elements of <{}>",
                                               open[depth - 1].name())
                                 : std::string("the bytes are no property list"));
-    ++position;
-    tag.closing = at("/");
-    position += tag.closing ? 1 : 0;
-    const std::size_t start = position;
-    while (position < text.size() && text[position] >= 'a' && text[position] <= 'z')
-        ++position;
-    tag.name = text.substr(start, position - start);
-    passSpace();
-    tag.empty = !tag.closing && at("/");
-    position += tag.empty ? 1 : 0;
-    if (position == text.size())
+    const std::size_t start = scanner.position();
+    const XmlScanner::Outcome outcome = scanner.readTag(tag);
+    if (outcome == XmlScanner::Outcome::ended)
         return endsEarly();
-    if (tag.name.empty() || tag.name.size() > 8 || text[position] != '>')
-        return refuse(fmt::format("the XML property list has a malformed tag behind {} bytes", start));
-    ++position;
-    return true;
+    // No element's name is longer than "integer".
+    return (outcome == XmlScanner::Outcome::passed && tag.name.size() <= 8) ||
+           refuse(fmt::format("the XML property list has a malformed tag behind {} bytes", start));
 }
 
 bool XmlPropertyListGuard::passRootElement()
@@ -280,8 +213,7 @@ bool XmlPropertyListGuard::closeContainer(const Tag& tag)
     const Container& closed = open[--depth];
     if (closed.awaitsValue)
         return refuse("the XML property list has a <key> without a value");
-    // libplist looks each new key up among the ones before it, in lists that a hostile choice of keys makes
-    // long.
+    // libplist compares each new key with the ones before it, with all of them if they are chosen for that.
     return budget.takeSteps(closed.keys * (closed.keys / 2 + closed.keyBytes / 256), why);
 }
 
@@ -299,19 +231,16 @@ bool XmlPropertyListGuard::passScalar(const Tag& tag)
     if (isString)
         return passString(tag, length);
 
-    // Plain text only: libplist puts the parts between comments together for some of these and not for
-    // others.
+    // Plain text only: of some of these libplist takes just the part before a comment.
     scalar = tag.name;
-    const std::size_t end = text.find('<', position);
-    if (end == std::string_view::npos)
+    const auto raw = scanner.passUntil("<");
+    if (!raw)
         return endsEarly();
-    const std::string_view raw = text.substr(position, end - position);
-    const std::string_view content = trimmedXmlText(raw);
-    position = end;
+    const std::string_view content = trimmedXmlText(*raw);
     if (!budget.takeBytes(content.size(), why) || !passEndOf(tag.name))
         return false;
     // libplist reads no number or date longer than this right.
-    const bool isShort = raw.size() < (tag.name == "date" ? 32 : 400);
+    const bool isShort = raw->size() < (tag.name == "date" ? 32 : 400);
     const bool good = isBoolean               ? content.empty()
                       : isData                ? isXmlData(content)
                       : !isShort              ? false
@@ -331,27 +260,20 @@ bool XmlPropertyListGuard::passString(const Tag& tag, std::size_t& length)
         return true;
     }
     for (;;) {
-        const std::size_t end = text.find('<', position);
-        if (end == std::string_view::npos)
+        const auto part = scanner.passUntil("<");
+        if (!part)
             return endsEarly();
-        const std::string_view part = text.substr(position, end - position);
-        length += part.size();
-        if (!passTextPart(part))
+        length += part->size();
+        if (!passTextPart(*part))
             return false;
-        position = end;
-        if (at("<!--")) {
-            position += 4;
-            if (!passBehind("-->"))
-                return false;
-        } else if (constexpr auto start = "<![CDATA["sv; at(start)) {
-            position += start.size();
-            const std::size_t before = position;
-            if (!passBehind("]]>"))
-                return false;
-            length += position - before;
-        } else {
+        const std::size_t start = scanner.position();
+        const bool isComment = scanner.pass("<!--");
+        if (!isComment && !scanner.pass("<![CDATA["))
             return budget.takeBytes(length, why) && passEndOf(tag.name);
-        }
+        if (!scanner.passBehind(isComment ? "-->" : "]]>"))
+            return endsEarly();
+        if (!isComment)
+            length += scanner.since(start).size();
     }
 }
 
@@ -373,13 +295,11 @@ bool XmlPropertyListGuard::passTextPart(std::string_view part)
 
 bool XmlPropertyListGuard::passEndOf(std::string_view name)
 {
-    if (position + 1 == text.size())
-        return endsEarly();
-    if (!at("</"))
-        return refuse(fmt::format("the XML property list has markup inside <{}>", name));
     Tag tag;
     if (!readTag(tag))
         return false;
+    if (!tag.closing)
+        return refuse(fmt::format("the XML property list has <{}> inside <{}>", tag.name, name));
     scalar = {};
     return tag.name == name ||
            refuse(fmt::format("the XML property list has </{}> where <{}> ends", tag.name, name));

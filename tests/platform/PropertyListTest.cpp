@@ -163,7 +163,7 @@ TEST(XmlPropertyList, RefusesWhatIsNoPropertyList)
               "the XML property list has </array> where <dict> ends");
     EXPECT_EQ(refusal("</array>"), "the XML property list has </array> where nothing ends");
     EXPECT_EQ(refusal("<string>a</strin>"), "the XML property list has </strin> where <string> ends");
-    EXPECT_EQ(refusal("<string>a<b/></string>"), "the XML property list has markup inside <string>");
+    EXPECT_EQ(refusal("<string>a<b/></string>"), "the XML property list has <b> inside <string>");
     EXPECT_EQ(refusal("<array/><array/>"), "something follows the XML property list");
     EXPECT_EQ(refusal("<plist><array/><array/></plist>"), "the XML property list holds more than one value");
     EXPECT_EQ(refusal("<plist></plist>"), "the XML property list has </plist> where nothing ends");
