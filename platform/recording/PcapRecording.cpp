@@ -1,6 +1,5 @@
 #include "platform/recording/PcapRecording.h"
 
-#include <algorithm>
 #include <array>
 #include <fmt/format.h>
 #include <pcap/pcap.h>
@@ -12,7 +11,6 @@ namespace {
 
 constexpr int kLinkType = DLT_USER0;
 static_assert(kLinkType == 147);
-constexpr time_t kLatestSecond = 8'000'000'000;
 
 std::string withoutName(std::string_view text, const std::string& path)
 {
@@ -24,15 +22,16 @@ std::string withoutName(std::string_view text, const std::string& path)
 
 } // namespace
 
-std::unique_ptr<RecordingReader> PcapRecording::open(const std::string& path, std::string& why)
+std::unique_ptr<RecordingReader> PcapRecording::open(File content, std::string& why)
 {
     std::array<char, PCAP_ERRBUF_SIZE> error{};
     pcap* file =
-        pcap_open_offline_with_tstamp_precision(path.c_str(), PCAP_TSTAMP_PRECISION_NANO, error.data());
+        pcap_fopen_offline_with_tstamp_precision(content.get(), PCAP_TSTAMP_PRECISION_NANO, error.data());
     if (!file) {
-        why = withoutName(error.data(), path);
+        why = error.data();
         return nullptr;
     }
+    static_cast<void>(content.release()); // pcap_close() closes it
     std::unique_ptr<PcapRecording> recording(new PcapRecording(file));
     if (const int linkType = pcap_datalink(file); linkType != kLinkType) {
         const char* name = pcap_datalink_val_to_name(linkType);
@@ -67,9 +66,7 @@ RecordingReader::Next PcapRecording::next(RecordedMessage& message)
         return Next::failed;
     }
     ++messages;
-    // pcapng can tell times that 64 bits of nanoseconds cannot.
-    message.time = RecordedTime(std::chrono::seconds(std::clamp<time_t>(header->ts.tv_sec, 0, kLatestSecond)) +
-                                std::chrono::nanoseconds(header->ts.tv_usec));
+    message.time = recordedTime(header->ts.tv_sec, header->ts.tv_usec);
     message.bytes = std::as_bytes(std::span(bytes, header->caplen));
     return Next::message;
 }

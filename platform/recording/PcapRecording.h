@@ -2,6 +2,8 @@
 
 #include "platform/recording/Recording.h"
 
+#include <cstdio>
+
 struct pcap;
 struct pcap_dumper;
 
@@ -10,7 +12,8 @@ namespace pelorus {
 /// A pcap or pcapng file, one packet a message.
 class PcapRecording : public RecordingReader {
 public:
-    static std::unique_ptr<RecordingReader> open(const std::string& path, std::string& why);
+    using File = std::unique_ptr<std::FILE, int (*)(std::FILE*)>;
+    static std::unique_ptr<RecordingReader> open(File content, std::string& why);
     ~PcapRecording() override;
 
     Next next(RecordedMessage& message) override;

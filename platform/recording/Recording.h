@@ -2,6 +2,7 @@
 
 #include <chrono>
 #include <cstddef>
+#include <cstdint>
 #include <memory>
 #include <span>
 #include <string>
@@ -10,6 +11,10 @@
 namespace pelorus {
 
 using RecordedTime = std::chrono::sys_time<std::chrono::nanoseconds>;
+
+/// The moment so long after 1970. Files can tell times that 64 bits of nanoseconds cannot: those become the
+/// end of what they can, some 250 years before and after.
+RecordedTime recordedTime(std::int64_t seconds, std::int64_t nanoseconds = 0);
 
 /// One log message as it was received, and when.
 struct RecordedMessage {

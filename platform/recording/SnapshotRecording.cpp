@@ -24,20 +24,21 @@ std::unique_ptr<RecordingReader> SnapshotRecording::open(std::span<const std::by
     const Value file = parsePropertyList(content, &why);
     if (!file)
         return nullptr;
-    const Value data = file.dictionary() ? file.dictionary()->at("Data") : Value();
-    if (!file.dictionary() || !file.dictionary()->find("Timestamp")) {
+    const Dictionary* snapshot = file.dictionary();
+    const Value data = snapshot ? snapshot->at("Data") : Value(); // none in one without save contents
+    if (!snapshot || !snapshot->find("Timestamp") || (data && !data.array())) {
         why = "a property list, but no snapshot";
         return nullptr;
     }
     auto recording = std::make_unique<SnapshotRecording>();
-    for (const Value& value : data.array() ? data.array()->elements : std::vector<Value>()) {
-        const Dictionary* entry = value.dictionary();
+    for (std::size_t number = 0; data && number < data.array()->elements.size(); ++number) {
+        const Dictionary* entry = data.array()->elements[number].dictionary();
         const Value messages = entry ? entry->at("DisplayState") : Value();
         if (!messages.data())
             continue;
         const Value date = entry->at("Date");
         recording->entries.push_back(
-            {messages.sharedData(), timeOfDateText(date.string() ? *date.string() : std::string())});
+            {number, messages.sharedData(), timeOfDateText(date.string() ? *date.string() : std::string())});
     }
     return recording;
 }
@@ -53,7 +54,8 @@ RecordingReader::Next SnapshotRecording::next(RecordedMessage& message)
     const auto rest = std::span(*entries[entry].messages).subspan(offset);
     const auto length = messageLength(rest);
     if (!length) {
-        reason = fmt::format("raw messages of entry {} make no sense from byte {} on", entry, offset);
+        reason = fmt::format("raw messages of entry {} make no sense from byte {} on", entries[entry].number,
+                             offset);
         return Next::failed;
     }
     message = {entries[entry].time, rest.first(*length)};
@@ -68,7 +70,7 @@ RecordedTime timeOfDateText(const std::string& text)
     if (!rest)
         return {};
     const long zone = parts.tm_gmtoff; // timegm() sets it to 0
-    return RecordedTime(std::chrono::seconds(timegm(&parts) - zone));
+    return recordedTime(timegm(&parts) - zone);
 }
 
 } // namespace pelorus

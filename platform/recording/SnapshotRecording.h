@@ -15,6 +15,7 @@ public:
 
 private:
     struct Entry {
+        std::size_t number; // among all of the snapshot
         Data messages;
         RecordedTime time;
     };
