@@ -68,15 +68,4 @@ bool isWornOut(const LteRadio& radio, std::size_t serving)
     return srxlev(radio[serving]) < kWornOut && reselectionTarget(radio, serving).has_value();
 }
 
-bool TimeToTrigger::holds(std::optional<std::size_t> target, double seconds)
-{
-    if (!target || target != current) {
-        current = target;
-        held = 0;
-        return false;
-    }
-    held += seconds;
-    return held >= needed;
-}
-
 } // namespace pelorus

@@ -31,7 +31,7 @@ double inSeconds(Milliseconds time)
 } // namespace
 
 LteHandset::LteHandset(std::uint64_t seed)
-    : random(seed), journey(kLteRoad, random), radio(journey.position(), random), server(random),
+    : random(seed), journey(kRoad, random), radio(journey.position(), random), server(random),
       frequencyError(random), reselection(kTreselection), handover(kHandoverTime)
 {}
 

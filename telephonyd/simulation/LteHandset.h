@@ -4,6 +4,7 @@
 #include "telephonyd/simulation/LteCellChoice.h"
 #include "telephonyd/simulation/LtePackets.h"
 #include "telephonyd/simulation/LteServerMessages.h"
+#include "telephonyd/simulation/TimeToTrigger.h"
 
 namespace pelorus {
 

@@ -8,8 +8,6 @@ const std::array<LteCarrier, kLteCarrierCount> kLteCarriers = {{
     {.earfcn = 3100, .band = 7, .resourceBlocks = 50, .priority = 6, .extraLoss = 5.0},
 }};
 
-const std::array<Point, kLteSiteCount> kLteSites = {{{0, 0}, {980, 150}, {430, 900}}};
-
 // Three sectors a site, whose physical identities differ modulo 3. The third site lies in the next tracking
 // area.
 const std::array<LteCell, kLteCellCount> kLteCells = {{
@@ -25,18 +23,6 @@ const std::array<LteCell, kLteCellCount> kLteCells = {{
     {1, 0, 48, 0.500, 0.866, 0x1870511, 4301, 4, 0, 1204},
     {1, 1, 229, -0.500, 0.866, 0x1870611, 4301, 4, 388, 250911},
     {1, 2, 414, 0.000, -1.000, 0x18A1211, 4302, 4, 771, 90377},
-}};
-
-const std::array<Point, 9> kLteRoad = {{
-    {120, -260},
-    {620, -220},
-    {1150, -120},
-    {1230, 320},
-    {800, 480},
-    {760, 1000},
-    {350, 1240},
-    {60, 820},
-    {-280, 240},
 }};
 
 } // namespace pelorus

@@ -1,8 +1,7 @@
 #pragma once
 
-#include "telephonyd/simulation/Journey.h"
-
 #include <array>
+#include <cstddef>
 #include <cstdint>
 
 namespace pelorus {
@@ -18,7 +17,7 @@ struct LteCarrier {
 
 struct LteCell {
     std::uint8_t carrier; // index of kLteCarriers
-    std::uint8_t site;    // index of kLteSites
+    std::uint8_t site;    // index of kSites
     std::uint16_t physicalCellIdentity;
     double eastward; // where its antenna looks, a unit vector
     double northward;
@@ -31,13 +30,9 @@ struct LteCell {
 
 constexpr std::size_t kLteCellCount = 12;
 constexpr std::size_t kLteCarrierCount = 2;
-constexpr std::size_t kLteSiteCount = 3;
 constexpr std::uint16_t kUplinkEarfcnOffset = 18000;
 
 extern const std::array<LteCarrier, kLteCarrierCount> kLteCarriers;
-extern const std::array<Point, kLteSiteCount> kLteSites;
 extern const std::array<LteCell, kLteCellCount> kLteCells;
-/// A way through the area.
-extern const std::array<Point, 9> kLteRoad;
 
 } // namespace pelorus

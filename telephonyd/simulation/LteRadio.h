@@ -1,6 +1,7 @@
 #pragma once
 
 #include "telephonyd/simulation/LteNetwork.h"
+#include "telephonyd/simulation/RadioField.h"
 
 namespace pelorus {
 
@@ -12,9 +13,7 @@ struct LteMeasurement {
     double averageRsrq = 0;
 };
 
-/// The radio field around the handset. Path loss grows with distance and behind the antennas; houses cast
-/// shadows that change over tens of metres, the same ones for all cells of a site; what is left fades from
-/// one measurement to the next. Cells of one carrier are each other's interference, as far as they carry
+/// What an LTE handset receives. Cells of one carrier are each other's interference, as far as they carry
 /// traffic.
 class LteRadio {
 public:
@@ -27,23 +26,14 @@ public:
     /// Of the whole bandwidth, dBm.
     double rssi(std::size_t carrier) const { return carrierRssi[carrier]; }
     /// Metres to the site.
-    double distance(std::size_t cell) const { return distances[kLteCells[cell].site]; }
+    double distance(std::size_t cell) const { return field.distance(kLteCells[cell].site); }
 
 private:
-    struct SiteView {
-        double loss; // dB
-        double eastward;
-        double northward;
-    };
-
-    SiteView see(std::size_t site, Point from);
-    void measure(Point where, Random& random);
+    void measure();
     void average(double gain);
 
-    std::vector<Drift> siteShadows;
-    std::vector<Drift> cellShadows;
+    RadioField field;
     std::vector<Drift> loads;
-    std::array<double, kLteSiteCount> distances{};
     std::array<double, kLteCarrierCount> carrierRssi{};
     std::array<LteMeasurement, kLteCellCount> measurements{};
 };

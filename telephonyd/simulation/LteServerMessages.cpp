@@ -2,16 +2,10 @@
 
 #include "LogGenerator/Osprey/CellMonitorKeys.h"
 #include "telephonyd/simulation/LteCellList.h"
-#include "telephonyd/simulation/PacketList.h"
-#include "telephonyd/simulation/PdpContexts.h"
-#include "telephonyd/simulation/SimFiles.h"
 
 namespace pelorus {
 
 namespace {
-
-constexpr std::uint32_t kSimFiles = 0xFF0000;
-constexpr std::uint32_t kContexts = 0xFF0002;
 
 constexpr double kForgottenBelow = 6.0; // dB under what makes a cell known
 
@@ -22,11 +16,6 @@ constexpr std::string_view kNeighbourKeys[] = {kPID, kBandInfo, kUARFCN}; // not
 constexpr MonitoredCellKind kNeighbourKind{kLTE, false, kNeighbourKeys};
 
 } // namespace
-
-LteServerMessages::LteServerMessages(Random& random)
-    : tmsi(0x20000000U + random.below(0x10000000U)), idleContexts(packetList(pdpContexts(false))),
-      sessionContexts(packetList(pdpContexts(true)))
-{}
 
 void LteServerMessages::cellsAround(MessageBatch& log, const LteRadio& radio,
                                     const LteSurroundings& surroundings, std::size_t serving)
@@ -52,12 +41,12 @@ void LteServerMessages::cellsAround(MessageBatch& log, const LteRadio& radio,
 
 void LteServerMessages::contexts(MessageBatch& log, bool inSession)
 {
-    log.list(kContexts, inSession ? sessionContexts : idleContexts);
+    subscriber.contexts(log, inSession);
 }
 
 void LteServerMessages::sim(MessageBatch& log, std::size_t serving)
 {
-    log.list(kSimFiles, packetList(simFiles(kLteCells[serving].trackingAreaCode, tmsi)));
+    subscriber.sim(log, kLteCells[serving].trackingAreaCode);
 }
 
 } // namespace pelorus

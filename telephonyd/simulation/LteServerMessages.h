@@ -2,7 +2,7 @@
 
 #include "telephonyd/simulation/LteRadio.h"
 #include "telephonyd/simulation/LteSurroundings.h"
-#include "telephonyd/simulation/MessageBatch.h"
+#include "telephonyd/simulation/SubscriberMessages.h"
 
 namespace pelorus {
 
@@ -10,7 +10,7 @@ namespace pelorus {
 /// contexts, and the cell monitor's list.
 class LteServerMessages {
 public:
-    explicit LteServerMessages(Random& random);
+    explicit LteServerMessages(Random& random) : subscriber(random) {}
 
     void cellsAround(MessageBatch& log, const LteRadio& radio, const LteSurroundings& surroundings,
                      std::size_t serving);
@@ -18,9 +18,7 @@ public:
     void sim(MessageBatch& log, std::size_t serving);
 
 private:
-    std::uint32_t tmsi;
-    std::vector<std::byte> idleContexts;
-    std::vector<std::byte> sessionContexts;
+    SubscriberMessages subscriber;
     CellMonitorList cellList;
     std::uint32_t knownCells = 0; // one bit each
 };
