@@ -50,7 +50,8 @@ void Base::updateWithData(const LogPacket&, LogCode)
 
 void Base::updateSectionRef(const Value& entry)
 {
-    sectionRef = {entry.sharedDictionary(), entry.sharedArray()};
+    sectionRef.keyed.bind(entry.sharedDictionary());
+    sectionRef.list.bind(entry.sharedArray());
     systemLog(kLogWarning, "%s", getSectionName());
 }
 
@@ -85,18 +86,6 @@ std::int16_t Base::lookUpECNO(std::uint32_t value)
         if (value > band.above)
             return band.decibels;
     return 0;
-}
-
-std::shared_ptr<Dictionary> Base::keyedEntry() const
-{
-    auto entry = sectionRef.keyed.lock();
-    return entry ? entry : makeDictionary();
-}
-
-std::shared_ptr<Array> Base::listEntry() const
-{
-    auto entry = sectionRef.list.lock();
-    return entry ? entry : makeArray();
 }
 
 } // namespace pelorus

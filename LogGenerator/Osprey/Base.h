@@ -43,17 +43,40 @@ protected:
     Base() = default;
 
     /// The display entry as the kind that this section fills. One that is unbound, or bound to an entry of
-    /// the other kind, gets a fresh one that nobody sees.
-    std::shared_ptr<Dictionary> keyedEntry() const;
-    std::shared_ptr<Array> listEntry() const;
+    /// the other kind, gets an empty one that nobody sees. Valid until the display changes.
+    Dictionary* keyedEntry() { return sectionRef.keyed.entry(); }
+    Array* listEntry() { return sectionRef.list.entry(); }
 
 private:
     Base(const Base&) = delete;
     Base& operator=(const Base&) = delete;
 
+    /// A reference to a container of the display, which the display may drop. Asking whether it did is cheap,
+    /// where sharing its ownership for every packet is not.
+    template <class Container> class Reference {
+    public:
+        void bind(const std::shared_ptr<Container>& entry)
+        {
+            watched = entry;
+            bound = entry.get();
+        }
+        Container* entry()
+        {
+            if (!watched.expired()) [[likely]]
+                return bound;
+            unseen = {};
+            return &unseen;
+        }
+
+    private:
+        std::weak_ptr<Container> watched;
+        Container* bound = nullptr;
+        Container unseen;
+    };
+
     struct {
-        std::weak_ptr<Dictionary> keyed;
-        std::weak_ptr<Array> list;
+        Reference<Dictionary> keyed;
+        Reference<Array> list;
     } sectionRef;
 };
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include <algorithm>
-#include <array>
+#include "LogGenerator/Osprey/PackedText.h"
+
 #include <cstdint>
 #include <string>
 #include <string_view>
@@ -27,20 +27,6 @@ public:
     void writeFixed(std::string& out, std::int64_t value) const;
 
 private:
-    static constexpr std::size_t kRoom = 16;
-    struct Affix {
-        std::array<char, kRoom> text{}; // copied whole, which is cheaper than counting
-        std::size_t length = 0;
-
-        consteval void set(std::string_view given)
-        {
-            if (given.size() > kRoom)
-                throw "a text that is too long";
-            std::copy(given.begin(), given.end(), text.begin());
-            length = given.size();
-        }
-    };
-
     consteval explicit Format(std::string_view text)
     {
         const std::size_t percent = text.find('%');
@@ -48,18 +34,25 @@ private:
         const std::string_view conversion = text.substr(percent, end - percent);
         if (conversion != "%d" && conversion != "%u" && conversion != "%4.2f" && conversion != "%f")
             throw "a conversion that rows do not use";
+        if (!PackedText::fits(text.substr(0, percent)) || !PackedText::fits(text.substr(end)))
+            throw "a text that is too long";
         isUnsigned = conversion == "%u";
         hasSixDecimals = conversion == "%f";
-        prefix.set(text.substr(0, percent));
-        suffix.set(text.substr(end));
+        prefix = PackedText(text.substr(0, percent));
+        suffix = PackedText(text.substr(end));
     }
 
-    Affix prefix;
-    Affix suffix;
+    /// Whether the texts around a number of so many characters leave it room in a packed text.
+    bool leavesRoomFor(unsigned characters) const
+    {
+        return prefix.length() + characters + suffix.length() <= PackedText::capacity;
+    }
+    void writeLong(std::string& out, std::string_view number) const;
+
+    PackedText prefix;
+    PackedText suffix;
     bool isUnsigned = false;
     bool hasSixDecimals = false;
-
-    class Text;
 };
 
 } // namespace pelorus

@@ -31,11 +31,17 @@ public:
     {
         if (!covers(field.end())) [[unlikely]]
             throw std::out_of_range("field beyond the packet");
-        return extract(field, load(field.byte));
+        return extract(field, load(field));
     }
 
     /// The field's value where bytes beyond the end read as 0.
-    std::int64_t padded(Field field) const { return extract(field, load(field.byte)); }
+    std::int64_t padded(Field field) const
+    {
+        if (covers(field.end()))
+            return (*this)[field];
+        const auto rest = from(field.byte);
+        return extract(field, loadBytes(rest.data(), rest.size()));
+    }
 
     /// Record `index` of `count`. Throws ArrayOutOfBoundsException unless index < count and the record lies
     /// wholly inside.
@@ -67,16 +73,25 @@ public:
     }
 
 private:
-    /// Up to 8 bytes from `offset` as a little-endian number, zero beyond the end.
-    std::uint64_t load(std::size_t offset) const
+    /// Eight bytes from the field's first on, as a little-endian number; fewer at the end, at least the
+    /// field's own.
+    std::uint64_t load(Field field) const
     {
+        const std::byte* const place = bytes.data() + field.byte;
+        if (field.byte + sizeof(std::uint64_t) > bytes.size()) [[unlikely]]
+            return loadBytes(place, field.end() - field.byte);
         std::uint64_t word = 0;
-        if (offset + sizeof word <= bytes.size()) [[likely]]
-            std::memcpy(&word, bytes.data() + offset, sizeof word);
-        else if (offset < bytes.size())
-            std::memcpy(&word, bytes.data() + offset, bytes.size() - offset);
+        std::memcpy(&word, place, sizeof word);
         if constexpr (std::endian::native == std::endian::big)
             word = __builtin_bswap64(word);
+        return word;
+    }
+
+    static std::uint64_t loadBytes(const std::byte* place, std::size_t count)
+    {
+        std::uint64_t word = 0;
+        for (std::size_t index = 0; index < count; ++index)
+            word |= std::to_integer<std::uint64_t>(place[index]) << (8 * index);
         return word;
     }
 

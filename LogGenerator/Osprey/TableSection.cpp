@@ -37,13 +37,12 @@ void TableSection::logUnknownCode(LogCode code)
     systemLog(kLogError, "Received an unknown log message: %d", static_cast<int>(code));
 }
 
-std::shared_ptr<Array> TableSection::listRow(Label label) const
+Array* TableSection::listRow(Label label)
 {
-    const auto rows = keyedEntry();
-    Value& row = rows->slot(label);
+    Value& row = keyedEntry()->slot(label);
     if (!row.array())
         row = makeArray();
-    return row.sharedArray();
+    return row.array();
 }
 
 void TableSection::showList(Array& list, PacketView data, Records records, std::size_t count,

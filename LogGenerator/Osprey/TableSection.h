@@ -43,9 +43,9 @@ public:
 
     // For the readings' functions.
 
-    std::shared_ptr<Dictionary> entry() const { return keyedEntry(); }
+    Dictionary* entry() { return keyedEntry(); }
     /// The list that a row of the keyed entry holds; it is made where the row has none.
-    std::shared_ptr<Array> listRow(Label label) const;
+    Array* listRow(Label label);
 
     void clearList() { rewriter.clear(*listEntry()); }
     /// Shows one dictionary of rows for each of the `count` records that lies wholly inside the packet.

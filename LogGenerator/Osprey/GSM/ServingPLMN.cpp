@@ -38,7 +38,7 @@ void writeDigits(std::string& out, PacketView data, std::span<const Field> digit
 
 void showArea(TableSection& section, const LogPacket& data)
 {
-    const auto entry = section.entry();
+    Dictionary* const entry = section.entry();
     writeDigits(entry->slot("Mobile Country Code").text(), data, Area::countryCode);
     writeDigits(entry->slot("Mobile Network Code").text(), data, Area::networkCode);
     kAreaCode.write(entry->slot("Location Area Code").text(),

@@ -48,7 +48,7 @@ void SimInfo::updateWithData(const LogPacket& data, LogCode logCode)
     const Dictionary* files = LogCode_0xFF0000::files(data).dictionary();
     if (!files)
         return;
-    const auto entry = keyedEntry();
+    Dictionary* const entry = keyedEntry();
     for (const SimFile& file : kSimFileRows)
         if (const Value* value = files->find(file.key))
             entry->set(file.row, *value);

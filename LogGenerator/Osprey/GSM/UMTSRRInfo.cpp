@@ -44,7 +44,7 @@ void showTransmitPower(TableSection& section, const LogPacket& data)
             sum += static_cast<double>((power + 512) / 10 - 70);
             ++samples;
         }
-    const auto entry = section.entry();
+    Dictionary* const entry = section.entry();
     std::string& shown = entry->slot("Transmit Power").text();
     shown.clear();
     // Without a sample this is 0 / 0, and shown as printf shows that: meant.
