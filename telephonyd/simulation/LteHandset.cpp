@@ -7,17 +7,17 @@ namespace {
 using namespace std::chrono_literals;
 using Milliseconds = std::chrono::milliseconds;
 
-constexpr Milliseconds kDrxCycle = 1280ms;
-constexpr Milliseconds kConnectedPeriod = 200ms;
+constexpr Milliseconds kDrxCycle = 320ms;
+constexpr Milliseconds kConnectedPeriod = 40ms;
 constexpr Milliseconds kBetweenMessages = 2ms; // of one measurement
-constexpr double kIdleGain = 0.4;              // of new measurements in the averages
-constexpr double kConnectedGain = 0.5;         // filterCoefficient fc4
+constexpr double kIdleGain = 0.12;             // of new measurements in the averages
+constexpr double kConnectedGain = 0.13;        // filterCoefficient fc4
 constexpr double kTreselection = 2.0;          // seconds
 constexpr double kHandoverTime = 0.32;
-constexpr Milliseconds kCellListPeriod = 10s;
+constexpr Milliseconds kCellListPeriod = 30s;
 constexpr Milliseconds kSearchPeriod = 60s; // of other technologies
 constexpr Milliseconds kSimPeriod = 30min;
-constexpr std::uint64_t kCyclesPerOtherCarrier = 8;
+constexpr std::uint64_t kCyclesPerOtherCarrier = 32;
 constexpr std::size_t kMostNeighbours = 6;
 constexpr std::size_t kMostMeasured = 8;
 constexpr std::size_t kMostDetected = 3;
