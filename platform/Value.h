@@ -96,6 +96,12 @@ public:
     Dictionary* dictionary() const { return pointee(std::get_if<std::shared_ptr<Dictionary>>(&held)); }
     std::shared_ptr<Array> sharedArray() const;
     std::shared_ptr<Dictionary> sharedDictionary() const;
+    /// The dictionary, which the value lets go of; null when it is of another kind.
+    std::shared_ptr<Dictionary> takeDictionary()
+    {
+        auto* present = std::get_if<std::shared_ptr<Dictionary>>(&held);
+        return present ? std::move(*present) : nullptr;
+    }
 
     /// The string to write into; a value of another kind becomes an empty string first.
     std::string& text()

@@ -4,8 +4,8 @@ namespace pelorus {
 
 void ListRewriter::clear(Array& list)
 {
-    for (const Value& element : list.elements)
-        if (auto rows = element.sharedDictionary(); rows && rows.use_count() == 2)
+    for (Value& element : list.elements)
+        if (auto rows = element.takeDictionary(); rows && rows.use_count() == 1)
             spare.push_back(std::move(rows));
     elements.clear();
     Base::clearElementsInArray(list);

@@ -39,7 +39,8 @@ void OSPLogGenerator2::updateState(State& state, std::span<const std::byte> data
 {
     takeOver(state);
     try {
-        getDisplayFromState(state);
+        if (!state.find("Display"))
+            getDisplayFromState(state);
         updateWithData(data);
     } catch (...) {
         keepRawMessage(data); // the message that ends the program is the one that its report needs

@@ -40,6 +40,8 @@ public:
     }
     constexpr void append(const PackedText& text)
     {
+        if (text.used == 0)
+            return;
         append(text.low, text.used < 8 ? text.used : 8);
         if (text.used > 8)
             append(text.high, text.used - 8);
@@ -49,11 +51,9 @@ public:
     static constexpr std::uint32_t kDigitsEnd = 100'000'000;
     constexpr void appendNumber(std::uint32_t value)
     {
-        constexpr std::uint64_t kZeros = 0x3030303030303030;
-        const std::uint64_t digits = four(value / 10'000) | four(value % 10'000) << 32;
-        const std::uint64_t significant = digits ^ kZeros;
-        const unsigned leading = significant ? static_cast<unsigned>(std::countr_zero(significant)) / 8 : 7;
-        append(digits >> (8 * leading), 8 - leading);
+        if (value < 10'000)
+            return appendSignificant<4>(four(value));
+        appendSignificant<8>(four(value / 10'000) | four(value % 10'000) << 32);
     }
     /// A point and `value` as two digits; value below 100.
     constexpr void appendHundredths(std::uint32_t value) { append('.' | two(value) << 8, 3); }
@@ -95,6 +95,15 @@ private:
     static constexpr std::uint64_t four(std::uint32_t value)
     {
         return two(value / 100) | two(value % 100) << 16;
+    }
+
+    template <unsigned count> constexpr void appendSignificant(std::uint64_t digits)
+    {
+        constexpr std::uint64_t kZeros = 0x3030303030303030 >> (64 - 8 * count);
+        constexpr std::uint64_t kLastDigit = std::uint64_t{1}
+                                             << (8 * count - 8); // ends the search at the last
+        const unsigned leading = static_cast<unsigned>(std::countr_zero((digits ^ kZeros) | kLastDigit)) / 8;
+        append(digits >> (8 * leading), count - leading);
     }
 
     std::uint64_t low = 0;
