@@ -81,11 +81,13 @@ void Screen::draw(const std::vector<std::string>& lines)
     if (!entered)
         return;
     std::string update;
+    if (drawn.size() != lines.size()) {
+        drawn.clear();
+        update = "\x1b[2J";
+    }
     for (std::size_t row = 0; row < lines.size(); ++row)
-        if (row >= drawn.size() || drawn[row] != lines[row])
+        if (drawn.empty() || drawn[row] != lines[row])
             update += fmt::format("\x1b[{};1H{}\x1b[0m\x1b[K", row + 1, lines[row]);
-    if (lines.size() != drawn.size())
-        update += fmt::format("\x1b[{};1H\x1b[J", lines.size() + 1);
     if (!update.empty())
         send("\x1b[?2026h" + update + "\x1b[?2026l"); // terminals that know it show the update at once
     drawn = lines;

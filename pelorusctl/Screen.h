@@ -27,7 +27,7 @@ public:
     };
     /// As the terminal is now; a change of it forgets what was drawn.
     Size size();
-    /// Shows the lines, which fit (see fitted()), from the top of the screen on.
+    /// Shows the lines, one for each row of the screen, which fit into it (see fitted()).
     void draw(const std::vector<std::string>& lines);
 
 private:

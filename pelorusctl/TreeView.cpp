@@ -12,6 +12,7 @@ namespace {
 
 constexpr std::size_t kIndent = 2;
 constexpr std::size_t kWidestName = 48;
+constexpr std::size_t kGap = 2; // between name and value
 // Both read well on dark and on light backgrounds, which the terminal's own palette takes care of.
 constexpr std::string_view kGroup = "\x1b[1;36m";
 constexpr std::string_view kStatus = "\x1b[7m";
@@ -135,15 +136,20 @@ std::string TreeView::drawn(const Line& line, std::size_t columns) const
     std::string text(std::min(line.depth * kIndent, columns), ' ');
     std::size_t left = columns - text.size();
     std::size_t used = 0;
-    const std::string name = fitted(line.name, left, used);
-    if (!line.leaf)
+    if (!line.leaf) {
+        const std::string name = fitted(line.name, left, used);
         return colours ? fmt::format("{}{}{}", text, kGroup, name) : text + name;
-    text += name;
-    left -= used;
-    const std::size_t gap = std::max(line.nameColumns, used) - used + 2;
-    if (left <= gap)
+    }
+    // On a narrow screen the name gives way, not the value.
+    const std::size_t valueColumns = columnsOf(line.value);
+    const std::size_t roomForName = left > valueColumns + kGap ? left - valueColumns - kGap : 0;
+    const std::size_t nameColumns = std::min(line.nameColumns, std::max(roomForName, left / 3));
+    text += fitted(line.name, nameColumns, used);
+    const std::size_t gap = nameColumns - used + kGap;
+    if (left <= used + gap)
         return text;
-    return text.append(gap, ' ') + fitted(line.value, left - gap, used);
+    left -= used + gap;
+    return text.append(gap, ' ') + fitted(line.value, left, used);
 }
 
 std::string TreeView::statusLine(std::size_t columns) const
