@@ -4,10 +4,9 @@
 #include "platform/PropertyList.h"
 #include "platform/scripted/ScriptedPlatform.h"
 #include "tests/support/RecordingLog.h"
+#include "tests/support/Texts.h"
 
-#include <fmt/format.h>
 #include <gmock/gmock.h>
-#include <regex>
 
 namespace pelorus::test {
 
@@ -22,19 +21,6 @@ public:
     int updates = 0;
     int connectionChanges = 0;
 };
-
-/// "%p" in place of every address.
-inline std::string withoutAddresses(const std::string& line)
-{
-    static const std::regex address("0x[0-9a-f]+");
-    return std::regex_replace(line, address, "%p");
-}
-
-inline std::string propertyListText(std::string_view content)
-{
-    return fmt::format("<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<plist version=\"1.0\">{}</plist>\n",
-                       content);
-}
 
 /// A model on a scripted machine whose telephony server answers "Osprey LTE", and whose LTE template has the
 /// SIM files and nothing else.
