@@ -1,3 +1,4 @@
+#include "LogGenerator/Osprey/GSM/OSP_GSMLogGenerator.h"
 #include "LogGenerator/Osprey/LTE/LTELogGenerator.h"
 #include "LogGenerator/Osprey/UTRAN/UTRANLogGenerator.h"
 #include "tests/generator/ProbeFixture.h"
@@ -58,11 +59,25 @@ TEST_F(StartCommand, OfUTRANWithoutATemplateIsEmpty)
     EXPECT_THAT(codes(command, "SetCtExtraCodes"), IsEmpty());
 }
 
-TEST_F(StartCommand, OfUTRANAsksForThePDPContextsAndTheSIM)
+TEST_F(StartCommand, OfUTRAN)
 {
     platform.addResource("UTRAN", propertyListText("<dict/>"));
     const Value command = UTRANLogGenerator::generator(platform)->getStartCommand();
-    EXPECT_THAT(codes(command, "SetCtExtraCodes"), testing::IsSupersetOf({0, 2}));
+    expectForm(command);
+    EXPECT_THAT(codes(command, "SetOspreyLogCodes"),
+                UnorderedElementsAre(0xD0E0, 0xD0E2, 0xD00A, 0xD00C, 0xD00E));
+    EXPECT_THAT(codes(command, "SetCtExtraCodes"), UnorderedElementsAre(0, 1, 2));
+}
+
+TEST_F(StartCommand, OfGSM)
+{
+    const Value command = OSP_GSMLogGenerator::generator(platform)->getStartCommand();
+    expectForm(command);
+    EXPECT_THAT(codes(command, "SetOspreyLogCodes"),
+                UnorderedElementsAre(0x4005, 0x4031, 0x4116, 0x4125, 0x4127, 0x4157, 0x417A, 0x4221, 0x5072,
+                                     0x5076, 0x512C, 0x5134, 0x5137, 0x51F4, 0x51F5, 0x51F6, 0x51F8, 0x51FB,
+                                     0x51FD, 0x51FF, 0x7130, 0x7131, 0x7132, 0x7135, 0x7150));
+    EXPECT_THAT(codes(command, "SetCtExtraCodes"), UnorderedElementsAre(0, 1, 2));
 }
 
 } // namespace

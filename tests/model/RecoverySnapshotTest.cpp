@@ -54,6 +54,22 @@ TEST_F(RecoverySnapshot, HoldsTheMessageThatThrew)
     EXPECT_EQ(entry(1).at("DLF").data()->size(), 161U + 13U);
 }
 
+TEST_F(RecoverySnapshot, HoldsTheMessageWithARecordBeyondItsEnd)
+{
+    platform.addResource("UTRAN", propertyListText("<dict><key>TRCH BLER</key><array/></dict>"));
+    platform.answerTechnology("Osprey UTRAN2");
+    model->restartMonitor();
+    Bytes message(17); // one transport channel is announced, none is there
+    message[0] = std::byte{0x01};
+    message[3] = std::byte{0x0C};
+    message[4] = std::byte{0xD0};
+    message[14] = std::byte{0x40};
+    EXPECT_THROW(platform.deliver(message), ArrayOutOfBoundsException);
+    model->writeRecoverySnapshot("ArrayOutOfBoundsException");
+    EXPECT_EQ(file().at("Description"), Value("Recovered after ArrayOutOfBoundsException"));
+    EXPECT_EQ(entry(0).at("DisplayState"), Value(makeData(message)));
+}
+
 TEST_F(RecoverySnapshot, HoldsTheMessagesBeforeItToo)
 {
     Bytes messages = simFiles("8949");
