@@ -106,10 +106,21 @@ public:
     /// The string to write into; a value of another kind becomes an empty string first.
     std::string& text()
     {
+        origin = {};
         if (auto* present = std::get_if<std::string>(&held)) [[likely]]
             return *present;
         return held.emplace<std::string>();
     }
+
+    /// What a text was made from: by whom (something that lives as long as the program) and of which number.
+    /// Who shows the same number again need not write the text again. Whatever changes the text ends it.
+    struct Origin {
+        const void* maker = nullptr;
+        std::int64_t number = 0;
+        friend bool operator==(const Origin&, const Origin&) = default;
+    };
+    bool isMadeFrom(const Origin& other) const { return origin == other; }
+    void setOrigin(const Origin& made) { origin = made; }
 
     /// Equal kind and equal content, containers compared element by element (dictionaries in any order).
     friend bool operator==(const Value& a, const Value& b);
@@ -123,6 +134,7 @@ private:
     std::variant<std::monostate, std::string, std::int64_t, double, bool, Date, Data, std::shared_ptr<Array>,
                  std::shared_ptr<Dictionary>>
         held;
+    Origin origin;
 };
 
 class Array {

@@ -4,8 +4,9 @@ namespace pelorus {
 
 void ListRewriter::clear(Array& list)
 {
-    for (Value& element : list.elements)
-        if (auto rows = element.takeDictionary(); rows && rows.use_count() == 1)
+    // From the end, so that each record finds its own rows again, which often show the same.
+    for (auto element = list.elements.rbegin(); element != list.elements.rend(); ++element)
+        if (auto rows = element->takeDictionary(); rows && rows.use_count() == 1)
             spare.push_back(std::move(rows));
     elements.clear();
     Base::clearElementsInArray(list);

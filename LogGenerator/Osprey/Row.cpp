@@ -5,23 +5,23 @@ namespace pelorus {
 bool writeRow(const Row& row, PacketView data, Value& out)
 {
     const std::int64_t raw = data[row.field];
-    if (!row.texts.empty())
-        if (const std::string_view text = row.texts.at(raw); !text.empty()) {
-            out.text().assign(text);
-            return true;
-        }
-    switch (row.kind) {
-    case Row::Kind::number:
-        row.format.write(out.text(), raw * row.scale + row.offset);
+    const Value::Origin origin{&row, raw};
+    if (out.isMadeFrom(origin))
         return true;
-    case Row::Kind::fixed:
-        row.format.writeFixed(out.text(), raw * row.scale + row.offset);
-        return true;
-    case Row::Kind::text:
-        out.text().assign(row.otherwise);
-        return !row.otherwise.empty();
-    }
-    return false;
+    std::string& shown = out.text();
+    const std::string_view text = row.texts.empty() ? std::string_view() : row.texts.at(raw);
+    if (!text.empty())
+        shown.assign(text);
+    else if (row.kind == Row::Kind::number)
+        row.format.write(shown, raw * row.scale + row.offset);
+    else if (row.kind == Row::Kind::fixed)
+        row.format.writeFixed(shown, raw * row.scale + row.offset);
+    else if (row.otherwise.empty())
+        return false;
+    else
+        shown.assign(row.otherwise);
+    out.setOrigin(origin);
+    return true;
 }
 
 void showRows(Dictionary& entry, std::span<const Row> rows, PacketView data)

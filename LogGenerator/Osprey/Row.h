@@ -93,7 +93,8 @@ constexpr Row text(Label label, Field field, TextTable texts, std::string_view o
     return {label, field, Row::Kind::text, "%d", 1, 0, texts, otherwise};
 }
 
-/// Writes the value of `row`; `out` keeps its memory. False when the row has nothing to show.
+/// Writes the value of `row`, which lives as long as the program; `out` keeps its memory, and its text where
+/// that shows the same already. False when the row has nothing to show.
 bool writeRow(const Row& row, PacketView data, Value& out);
 
 /// Sets the rows of a keyed entry: adds or overwrites, removes nothing.
