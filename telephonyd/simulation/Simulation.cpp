@@ -1,5 +1,6 @@
 #include "telephonyd/simulation/Simulation.h"
 
+#include "telephonyd/simulation/GsmHandset.h"
 #include "telephonyd/simulation/LteHandset.h"
 
 namespace pelorus {
@@ -17,6 +18,7 @@ template <class T> std::unique_ptr<Handset> make(std::uint64_t seed)
 }
 
 constexpr Technology kTechnologies[] = {
+    {"Osprey GSM", make<GsmHandset>},
     {"Osprey LTE", make<LteHandset>},
 };
 
