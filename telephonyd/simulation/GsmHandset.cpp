@@ -1,5 +1,7 @@
 #include "telephonyd/simulation/GsmHandset.h"
 
+#include "telephonyd/simulation/Units.h"
+
 namespace pelorus {
 
 namespace {

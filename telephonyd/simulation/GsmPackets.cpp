@@ -6,17 +6,13 @@
 #include "LogGenerator/Osprey/GSM/LogCode_0x5137.h"
 #include "LogGenerator/Osprey/GSM/LogCode_0x51F8.h"
 #include "LogGenerator/Osprey/GSM/LogCode_0x51FF.h"
+#include "telephonyd/simulation/Units.h"
 
 namespace pelorus {
 
 namespace {
 
 constexpr double kLowestAccessLevel = -104.0; // RXLEV_ACCESS_MIN
-
-int rounded(double value)
-{
-    return static_cast<int>(std::lround(value));
-}
 
 /// RXLEV (3GPP TS 45.008, 8.1.4), 0 to 63.
 int receiveLevel(double level)

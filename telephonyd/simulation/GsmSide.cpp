@@ -1,6 +1,7 @@
 #include "telephonyd/simulation/GsmSide.h"
 
 #include "telephonyd/simulation/UmtsPackets.h"
+#include "telephonyd/simulation/Units.h"
 
 #include <algorithm>
 
@@ -106,7 +107,7 @@ void GsmSide::reportDedicated(MessageBatch& log, Random& random)
 GsmQuality GsmSide::quality(Random& random) const
 {
     const double errors = (-92.0 - receiver.average(servingCell)) / 3.0 + 1.5 * interference.now();
-    const auto onScale = [](double value) { return std::clamp(static_cast<int>(std::lround(value)), 0, 7); };
+    const auto onScale = [](double value) { return std::clamp(rounded(value), 0, 7); };
     return {onScale(errors), onScale(errors + 0.6 * random.normal())};
 }
 
@@ -116,7 +117,7 @@ std::optional<std::size_t> GsmSide::target()
     const bool isBetter =
         reselectionCriterion(receiver, best) > reselectionCriterion(receiver, servingCell) + kHysteresis;
     const auto cell = isBetter ? std::optional(best) : std::nullopt;
-    return change.holds(cell, std::chrono::duration<double>(period()).count()) ? cell : std::nullopt;
+    return change.holds(cell, inSeconds(period())) ? cell : std::nullopt;
 }
 
 } // namespace pelorus

@@ -2,6 +2,7 @@
 
 #include "telephonyd/simulation/GsmHandset.h"
 #include "telephonyd/simulation/LteHandset.h"
+#include "telephonyd/simulation/UtranHandset.h"
 
 namespace pelorus {
 
@@ -20,6 +21,7 @@ template <class T> std::unique_ptr<Handset> make(std::uint64_t seed)
 constexpr Technology kTechnologies[] = {
     {"Osprey GSM", make<GsmHandset>},
     {"Osprey LTE", make<LteHandset>},
+    {"Osprey UTRAN2", make<UtranHandset>},
 };
 
 } // namespace

@@ -5,6 +5,7 @@
 #include "LogGenerator/Osprey/GSM/LogCode_0x4127.h"
 #include "LogGenerator/Osprey/GSM/LogCode_0x417A.h"
 #include "telephonyd/simulation/RankedCells.h"
+#include "telephonyd/simulation/Units.h"
 
 #include <algorithm>
 
@@ -25,11 +26,6 @@ constexpr double kPowerSpread = 1.5;
 constexpr double kLowestPower = -50.0;
 constexpr double kHighestPower = 24.0;
 constexpr std::size_t kPowerSamples = 4;
-
-int rounded(double value)
-{
-    return static_cast<int>(std::lround(value));
-}
 
 void writeSetMember(const PacketWriter& packet, Records measurements, std::size_t index, std::size_t cell,
                     int set, double ecio)

@@ -1,6 +1,7 @@
 #include "telephonyd/simulation/UmtsSide.h"
 
 #include "telephonyd/simulation/GsmPackets.h"
+#include "telephonyd/simulation/Units.h"
 
 namespace pelorus {
 
@@ -23,11 +24,6 @@ constexpr double kGood = -98.0;
 constexpr double kGoodEcio = -13.0; // dB
 
 } // namespace
-
-double inSeconds(std::chrono::milliseconds time)
-{
-    return std::chrono::duration<double>(time).count();
-}
 
 RegistrationArea UmtsSide::area() const
 {

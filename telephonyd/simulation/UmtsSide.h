@@ -53,6 +53,4 @@ private:
     std::uint64_t reports = 0;
 };
 
-double inSeconds(std::chrono::milliseconds time);
-
 } // namespace pelorus
