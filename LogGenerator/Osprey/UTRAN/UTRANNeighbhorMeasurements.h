@@ -1,0 +1,13 @@
+#pragma once
+
+#include "LogGenerator/Osprey/TableSection.h"
+
+namespace pelorus {
+
+/// The measured UTRAN neighbours, one dictionary a cell.
+class UTRANNeighbhorMeasurements : public TableSection {
+public:
+    UTRANNeighbhorMeasurements();
+};
+
+} // namespace pelorus
