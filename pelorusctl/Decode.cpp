@@ -23,6 +23,15 @@ std::optional<std::chrono::nanoseconds> interval(const DecodeOptions& options)
     return std::chrono::nanoseconds(std::llround(std::min(*options.everySeconds, kLongest) * 1e9));
 }
 
+/// The decoders' last lines come when they are destroyed: the sink stays theirs until after that.
+class ChosenSink {
+public:
+    explicit ChosenSink(SystemLogSink* sink) { setSystemLogSink(sink); }
+    ~ChosenSink() { setSystemLogSink(nullptr); }
+    ChosenSink(const ChosenSink&) = delete;
+    ChosenSink& operator=(const ChosenSink&) = delete;
+};
+
 } // namespace
 
 int decode(const DecodeOptions& options)
@@ -37,7 +46,7 @@ int decode(const DecodeOptions& options)
 
     if (!options.resources.empty() && !isDirectory(options.resources))
         return fail(options.resources, "no directory");
-    setSystemLogSink(log.get());
+    const ChosenSink chosenSink(log.get());
     LinuxPlatform platform({options.resources, false});
     OfflineMonitor monitor(LogGenerator::generatorFromTechnology(platform, options.technology),
                            interval(options),

@@ -28,11 +28,17 @@ std::string updatedText(std::chrono::system_clock::time_point moment)
                        fmt::localtime(std::chrono::system_clock::to_time_t(moment)));
 }
 
+bool wantsColours()
+{
+    const char* refusal = std::getenv("NO_COLOR"); // an empty one refuses nothing (no-color.org)
+    return refusal == nullptr || *refusal == '\0';
+}
+
 /// The monitor in a terminal: prints every update, or redraws it in place.
 class LiveView : public PelorusModelObserver {
 public:
     LiveView(const LiveOptions& what, LinuxPlatform& system)
-        : options(what), platform(system), model(system, *this), view(std::getenv("NO_COLOR") == nullptr)
+        : options(what), platform(system), model(system, *this), view(wantsColours())
     {
         view.setStatus("Connecting...");
         setLastWords([this](const std::string& exception) {
@@ -86,7 +92,8 @@ public:
             raise(SIGSTOP);
             break;
         case SIGCONT:
-            if (onScreen) {
+            if (onScreen) { // drawn anew, also when nobody told us of the stop
+                screen.leave();
                 screen.enter();
                 redraw();
             }

@@ -14,13 +14,21 @@ void OfflineMonitor::receive(const RecordedMessage& message)
     if (nextTick && message.time > *nextTick) {
         if (updated)
             refresh();
-        // The tick at or after this message.
-        const auto beyond = message.time - *nextTick - std::chrono::nanoseconds(1);
-        *nextTick += (beyond / *interval + 1) * *interval;
+        nextTick = tickFrom(*nextTick, message.time);
     }
     generator->updateState(state, message.bytes);
     lastMessage = message.time;
     updated = true;
+}
+
+RecordedTime OfflineMonitor::tickFrom(RecordedTime passed, RecordedTime moment) const
+{
+    // Unsigned, because recorded times can lie further apart than a signed difference reaches.
+    const auto count = [](std::chrono::nanoseconds time) { return static_cast<std::uint64_t>(time.count()); };
+    const std::uint64_t beyond = count(moment.time_since_epoch()) - count(passed.time_since_epoch());
+    const std::uint64_t sinceTick = beyond % count(*interval);
+    const auto tick = moment - std::chrono::nanoseconds(sinceTick);
+    return sinceTick == 0 ? tick : tick + *interval;
 }
 
 void OfflineMonitor::finish()

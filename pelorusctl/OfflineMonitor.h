@@ -27,6 +27,8 @@ public:
 
 private:
     void refresh();
+    /// The first tick at or after a moment that lies behind the tick that passed.
+    RecordedTime tickFrom(RecordedTime passed, RecordedTime moment) const;
 
     std::unique_ptr<LogGenerator> generator;
     State state;

@@ -86,8 +86,9 @@ void Screen::draw(const std::vector<std::string>& lines)
         update = "\x1b[2J";
     }
     for (std::size_t row = 0; row < lines.size(); ++row)
-        if (drawn.empty() || drawn[row] != lines[row])
-            update += fmt::format("\x1b[{};1H{}\x1b[0m\x1b[K", row + 1, lines[row]);
+        if (drawn.empty() ||
+            drawn[row] != lines[row]) // erased first: behind a full line it would take its end
+            update += fmt::format("\x1b[{};1H\x1b[K{}\x1b[0m", row + 1, lines[row]);
     if (!update.empty())
         send("\x1b[?2026h" + update + "\x1b[?2026l"); // terminals that know it show the update at once
     drawn = lines;

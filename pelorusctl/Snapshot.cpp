@@ -2,13 +2,13 @@
 #include "pelorusctl/Output.h"
 #include "pelorusctl/TreeOutput.h"
 #include "platform/PropertyList.h"
+#include "platform/linux/Files.h"
 
 #include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <fmt/format.h>
 #include <fstream>
-#include <iterator>
 #include <nlohmann/json.hpp>
 #include <vector>
 
@@ -112,14 +112,16 @@ int extract(const Data& dlf, const SnapshotOptions& options)
 
 int snapshot(const SnapshotOptions& options)
 {
-    std::ifstream file(options.snapshot, std::ios::binary);
-    const std::vector<char> bytes{std::istreambuf_iterator<char>(file), {}};
-    if (!file.is_open() || file.bad())
-        return fail(options.snapshot, std::strerror(errno));
-    if (bytes.empty())
+    if (isDirectory(options.snapshot))
+        return fail(options.snapshot, std::strerror(EISDIR));
+    errno = 0;
+    const auto bytes = readWholeFile(options.snapshot);
+    if (!bytes)
+        return fail(options.snapshot, std::strerror(errno ? errno : EFBIG));
+    if (bytes->empty())
         return fail(options.snapshot, "the file is empty");
     std::string why;
-    const Value content = parsePropertyList(std::as_bytes(std::span(bytes)), &why);
+    const Value content = parsePropertyList(*bytes, &why);
     if (!content)
         return fail(options.snapshot, why);
     if (!content.dictionary() || !content.dictionary()->find("Timestamp"))

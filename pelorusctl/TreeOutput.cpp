@@ -1,5 +1,7 @@
 #include "pelorusctl/TreeOutput.h"
 
+#include "platform/Utf8.h"
+
 #include <fmt/format.h>
 #include <nlohmann/json.hpp>
 
@@ -21,6 +23,11 @@ void addText(std::string& out, const PelorusModelNode& node, std::size_t depth)
     if (node.childNodes())
         for (const auto& child : *node.childNodes())
             addText(out, *child, depth + 1);
+}
+
+std::string escaped(unsigned char byte)
+{
+    return fmt::format("\\x{:02x}", byte);
 }
 
 Json jsonOf(const PelorusModelNode& node, std::string& path)
@@ -46,13 +53,21 @@ Json jsonOf(const PelorusModelNode& node, std::string& path)
 std::string printable(std::string_view text)
 {
     std::string shown;
-    for (const char character : text) {
-        if (character == '\n')
+    std::size_t validEnd = validUtf8Prefix(text);
+    for (std::size_t place = 0; place < text.size(); ++place) {
+        const auto byte = [text](std::size_t at) { return static_cast<unsigned char>(text[at]); };
+        if (byte(place) == '\n') {
             shown += "\\n";
-        else if (static_cast<unsigned char>(character) < 0x20 || character == 0x7F)
-            shown += fmt::format("\\x{:02x}", static_cast<unsigned char>(character));
-        else
-            shown += character;
+        } else if (place == validEnd) {
+            shown += escaped(byte(place));
+            validEnd += 1 + validUtf8Prefix(text.substr(place + 1));
+        } else if (byte(place) < 0x20 || byte(place) == 0x7F) {
+            shown += escaped(byte(place));
+        } else if (byte(place) == 0xC2 && byte(place + 1) < 0xA0) { // to a terminal U+009B is what ESC [ is
+            shown += escaped(byte(++place));
+        } else {
+            shown += text[place];
+        }
     }
     return shown;
 }

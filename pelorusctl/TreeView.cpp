@@ -40,6 +40,17 @@ constexpr KeyText kKeys[] = {
     {"G", Command::last},           {"q", Command::quit},
 };
 
+/// A key that means nothing here goes as a whole, lest the letter at its end be taken for a command.
+std::size_t lengthOfUnknownKey(std::string_view keys)
+{
+    if (keys[0] != '\x1b' || keys.size() < 2)
+        return 1;
+    if (keys[1] != '[') // "\x1bOP", or a letter pressed with Alt
+        return std::min<std::size_t>(keys[1] == 'O' ? 3 : 2, keys.size());
+    const auto end = std::find_if(keys.begin() + 2, keys.end(), [](char c) { return c >= '@' && c <= '~'; });
+    return static_cast<std::size_t>(end - keys.begin()) + (end != keys.end() ? 1 : 0);
+}
+
 /// Takes the next key off `keys`.
 Command nextKey(std::string_view& keys)
 {
@@ -48,7 +59,7 @@ Command nextKey(std::string_view& keys)
             keys.remove_prefix(known.text.size());
             return known.command;
         }
-    keys.remove_prefix(1);
+    keys.remove_prefix(lengthOfUnknownKey(keys));
     return Command::none;
 }
 
@@ -57,7 +68,7 @@ Command nextKey(std::string_view& keys)
 void TreeView::setTree(const PelorusModelNode& root)
 {
     tree.clear();
-    add(root, 0, 0);
+    add(root, 0, columnsOf(printable(root.displayName())));
 }
 
 void TreeView::add(const PelorusModelNode& node, std::size_t depth, std::size_t nameColumns)

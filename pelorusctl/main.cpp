@@ -5,6 +5,7 @@
 
 #include <CLI/CLI.hpp>
 #include <QCoreApplication>
+#include <clocale>
 #include <cmath>
 #include <functional>
 
@@ -46,6 +47,8 @@ int main(int argc, char** argv)
 {
     const QCoreApplication application(argc, argv);
     QCoreApplication::setApplicationName("pelorusctl");
+    std::setlocale(LC_NUMERIC,
+                   "C"); // which Qt has set to the user's; an interval has a point in any language
     reportUncaughtException();
 
     CLI::App arguments("Cellular field-test monitor for the terminal", "pelorusctl");
