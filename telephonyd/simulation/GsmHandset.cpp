@@ -30,8 +30,8 @@ void GsmHandset::step(MessageBatch& log)
     const Milliseconds end = now + period();
     repeatWhatIsDue(log);
     report(log);
-    if (technology == Technology::umts && activity != Activity::idle)
-        if (const auto cell = umts.followActiveSet())
+    if (technology == Technology::umts)
+        if (const auto cell = umts.target())
             enterUmts(log, *cell);
     decide();
     while (const auto event = signalling.run(log, end))
@@ -78,7 +78,7 @@ void GsmHandset::decide()
     if (leaving.holds(elsewhere ? std::optional<std::size_t>(0) : std::nullopt, inSeconds(period()))) {
         target = *elsewhere;
         start(does.leaving[doing]);
-    } else if (const auto cell = does.cellChange[doing].empty() ? std::nullopt : cellTarget()) {
+    } else if (const auto cell = does.cellChange[doing].empty() ? std::nullopt : gsm.target()) {
         target = *cell;
         start(does.cellChange[doing]);
     } else if (now >= phaseEnds) {
@@ -113,11 +113,6 @@ std::optional<std::size_t> GsmHandset::otherTechnologyTarget() const
     return umts.isWornOut() && gsm.radio().average(best) > kGoodGsm ? std::optional(best) : std::nullopt;
 }
 
-std::optional<std::size_t> GsmHandset::cellTarget()
-{
-    return inGsm() ? gsm.target() : umts.reselectionTarget();
-}
-
 void GsmHandset::perform(HandsetEvent event, MessageBatch& log)
 {
     switch (event) {
@@ -139,11 +134,13 @@ void GsmHandset::perform(HandsetEvent event, MessageBatch& log)
         return subscriber.contexts(log, activity == Activity::data);
     case HandsetEvent::locationUpdated:
         registered.locationArea = area().locationArea;
-        return writeServingNetwork(log, &registered);
+        return writeServingNetwork(
+            log, routingTechnology == Technology::none ? ServiceType::csOnly : ServiceType::csAndPs,
+            registered);
     case HandsetEvent::routingUpdated:
         registered.routingArea = area().routingArea;
         routingTechnology = technology;
-        return writeServingNetwork(log, &registered);
+        return writeServingNetwork(log, ServiceType::csAndPs, registered);
     case HandsetEvent::registered:
         writeEquivalentNetworks(log);
         subscriber.contexts(log, false);
@@ -155,7 +152,7 @@ void GsmHandset::perform(HandsetEvent event, MessageBatch& log)
 void GsmHandset::enterGsm(MessageBatch& log)
 {
     if (technology == Technology::none)
-        writeServingNetwork(log, nullptr);
+        writeServingNetwork(log, ServiceType::limited, {});
     if (technology != Technology::gsm)
         nextSearch = soon(40, 70); // it does not come back at once
     technology = Technology::gsm;

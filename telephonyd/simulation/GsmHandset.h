@@ -31,7 +31,6 @@ private:
     void decide();
     bool keepRegistered();
     std::optional<std::size_t> otherTechnologyTarget() const;
-    std::optional<std::size_t> cellTarget();
     void start(Procedure procedure) { signalling.start(procedure, now); }
     const Procedures& procedures() const { return inGsm() ? kGsmProcedures : kUmtsProcedures; }
 

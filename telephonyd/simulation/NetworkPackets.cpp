@@ -8,8 +8,6 @@ namespace pelorus {
 namespace {
 
 constexpr int kOperatingMode = 1; // class II: no common procedures of the two domains
-constexpr int kFullService = 3;
-constexpr int kLimitedService = 4;
 
 constexpr int kFiller = 0xF;
 constexpr int kCountryCode[] = {0, 0, 1};
@@ -18,21 +16,19 @@ constexpr int kNetworkCodeInThreeDigits[] = {0, 0, 1};
 
 } // namespace
 
-void writeServingNetwork(MessageBatch& log, const RegistrationArea* area)
+void writeServingNetwork(MessageBatch& log, ServiceType service, RegistrationArea area)
 {
     using Layout = LogCode_0x7135;
     PacketWriter packet = log.packet(0x7135, Layout::minimumLength);
     packet.put(Layout::networkOperatingMode, kOperatingMode);
-    packet.put(Layout::serviceType, area ? kFullService : kLimitedService);
+    packet.put(Layout::serviceType, static_cast<std::int64_t>(service));
     for (std::size_t digit = 0; digit < 3; ++digit) {
         packet.put(Layout::countryCode[digit], kCountryCode[digit]);
         packet.put(Layout::networkCode[digit], kNetworkCode[digit]);
     }
-    if (!area)
-        return;
-    packet.put(Layout::locationAreaHigh, area->locationArea >> 8);
-    packet.put(Layout::locationAreaLow, area->locationArea & 0xFF);
-    packet.put(Layout::routingArea, area->routingArea);
+    packet.put(Layout::locationAreaHigh, area.locationArea >> 8);
+    packet.put(Layout::locationAreaLow, area.locationArea & 0xFF);
+    packet.put(Layout::routingArea, area.routingArea);
 }
 
 void writeEquivalentNetworks(MessageBatch& log)

@@ -10,8 +10,10 @@ struct RegistrationArea {
     std::uint8_t routingArea = 0;
 };
 
-/// The serving network, 001/01, 0x7135. Without an area there is limited service only.
-void writeServingNetwork(MessageBatch& log, const RegistrationArea* area);
+enum class ServiceType : std::uint8_t { none, csOnly, psOnly, csAndPs, limited };
+
+/// The serving network, 001/01, 0x7135.
+void writeServingNetwork(MessageBatch& log, ServiceType service, RegistrationArea area);
 
 /// The equivalent networks, 0x7150: the home network alone.
 void writeEquivalentNetworks(MessageBatch& log);

@@ -7,8 +7,8 @@ namespace pelorus {
 namespace {
 
 // dB
-constexpr double kJoinWithin = 3.0;
-constexpr double kLeaveBehind = 5.0;
+constexpr double kJoinWithin = 4.0;
+constexpr double kLeaveBehind = 6.0;
 constexpr double kReplaceBetter = 1.5;
 
 } // namespace

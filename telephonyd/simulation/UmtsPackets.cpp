@@ -16,8 +16,8 @@ namespace {
 constexpr std::size_t kMostMonitored = 4;
 constexpr int kActiveSet = 0;
 constexpr int kMonitoredSet = 1;
-constexpr double kFullScale = 524288; // of the linear Ec/Io
-constexpr double kLowestEcio = -24.0;
+constexpr double kFullScale = 524288;      // of the linear Ec/Io
+constexpr double kLowestEcio = -20.0;      // the pilot is lost below
 constexpr double kRankingHysteresis = 4.0; // Qhyst1, dB
 
 // 3GPP TS 25.331, 10.3.7.43: open loop, with interference and the service's needs in one.
@@ -46,7 +46,7 @@ void writeUmtsCellSet(MessageBatch& log, const UmtsRadio& radio, const SoftHando
     RankedCells<kUmtsCellCount> monitored;
     for (std::size_t cell = 0; cell < kUmtsCellCount; ++cell)
         if (!activeSet.contains(cell) && radio.isDetected(cell))
-            monitored.add(cell, radio[cell].ecio);
+            monitored.add(cell, radio[cell].averageEcio);
     monitored.limit(kMostMonitored);
     const std::size_t count = activeSet.size() + monitored.size();
 
@@ -56,9 +56,9 @@ void writeUmtsCellSet(MessageBatch& log, const UmtsRadio& radio, const SoftHando
     packet.put(Layout::cellCount, static_cast<std::int64_t>(count));
     std::size_t index = 0;
     for (const std::size_t cell : activeSet)
-        writeSetMember(packet, measurements, index++, cell, kActiveSet, radio[cell].ecio);
+        writeSetMember(packet, measurements, index++, cell, kActiveSet, radio[cell].averageEcio);
     for (const std::size_t cell : monitored)
-        writeSetMember(packet, measurements, index++, cell, kMonitoredSet, radio[cell].ecio);
+        writeSetMember(packet, measurements, index++, cell, kMonitoredSet, radio[cell].averageEcio);
 }
 
 void writeRankedUmtsCells(MessageBatch& log, const UmtsRadio& radio, std::size_t serving)
@@ -84,7 +84,7 @@ void writeRankedUmtsCells(MessageBatch& log, const UmtsRadio& radio, std::size_t
         entry.put(Cell::scramblingCode, kUmtsCells[cell].scramblingCode);
         entry.put(Cell::rscp, rscp + 21);
         entry.put(Cell::rankRscp, rscp);
-        entry.put(Cell::ecno, rounded(radio[cell].averageEcio * 2.0));
+        entry.put(Cell::ecno, rounded(std::max(radio[cell].averageEcio, kLowestEcio) * 2.0));
         entry.put(Cell::rankingValue, rounded(rank(cell)));
     }
 }

@@ -33,10 +33,6 @@ constexpr SignallingStep kRoutingAreaUpdate[] = {
     ciphering(5ms, false),
 };
 
-constexpr SignallingStep kReselection[] = {
-    event(180ms, umtsCellEntered),
-};
-
 constexpr SignallingStep kCallSetup[] = {
     mm(0ms, MM_WAIT_FOR_RR_CONNECTION_MM),
     rrc(10ms, RRC_CONNECTING),
@@ -100,7 +96,7 @@ constexpr SignallingStep kCellChangeOrderToGsm[] = {
 const Procedures kUmtsProcedures = {
     .locationUpdate = kLocationUpdate,
     .routingAreaUpdate = kRoutingAreaUpdate,
-    .cellChange = {kReselection, {}, {}}, // connected, the active set changes instead
+    .cellChange = {}, // it just follows the signal
     .leaving = {kReselectionToGsm, kHandoverToGsm, kCellChangeOrderToGsm},
     .beginning = {Procedure(), kCallSetup, kDataSetup},
     .ending = {Procedure(), kCallRelease, kDataRelease},

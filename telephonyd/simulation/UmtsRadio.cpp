@@ -17,7 +17,7 @@ constexpr double kTraffic = 7.5;
 constexpr double kLoadMean = 0.35;
 constexpr double kLoadDeviation = 0.18;
 constexpr double kLoadMemory = 20.0; // seconds
-constexpr double kFilterMemory = 1.2;
+constexpr double kFilterMemory = 0.5;
 // Reportable range of the RSCP (3GPP TS 25.133, 9.1.1.3), and what can still be found of a pilot.
 constexpr double kLowestRscp = -120.0;
 constexpr double kHighestRscp = -40.0;

@@ -92,6 +92,11 @@ void UmtsSide::reportConnected(MessageBatch& log, Random& random)
         traffic.writeBlockErrors(log);
 }
 
+std::optional<std::size_t> UmtsSide::target()
+{
+    return connected ? followActiveSet() : reselectionTarget();
+}
+
 std::optional<std::size_t> UmtsSide::reselectionTarget()
 {
     const std::size_t best = receiver.best();

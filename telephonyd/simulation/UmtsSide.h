@@ -30,11 +30,9 @@ public:
     Milliseconds period() const;
     void report(MessageBatch& log, const GsmRadio& gsm, Random& random);
 
-    /// The cell that an idle handset would camp on instead.
-    std::optional<std::size_t> reselectionTarget();
-    /// Where a connected one, whose active set changes here, has lost its serving cell: the best that is
-    /// left.
-    std::optional<std::size_t> followActiveSet();
+    /// The cell that is to serve instead: a better one, or where the active set of a connected handset, which
+    /// changes here, has lost the serving one, the best that is left.
+    std::optional<std::size_t> target();
 
     /// That the handset should leave for GSM, or may come back.
     bool isWornOut() const;
@@ -43,11 +41,13 @@ public:
 private:
     void reportIdle(MessageBatch& log, const GsmRadio& gsm);
     void reportConnected(MessageBatch& log, Random& random);
+    std::optional<std::size_t> reselectionTarget();
+    std::optional<std::size_t> followActiveSet();
 
     UmtsRadio receiver;
     SoftHandover activeSet;
     UmtsTraffic traffic;
-    TimeToTrigger reselection{1.6};
+    TimeToTrigger reselection{1.0};
     std::size_t servingCell = 0;
     bool connected = false;
     std::uint64_t reports = 0;
