@@ -4,7 +4,6 @@
 #include "platform/SystemLog.h"
 
 #include <array>
-#include <iterator>
 #include <stdexcept>
 
 namespace pelorus {
@@ -73,9 +72,7 @@ void Base::clearElementsInArray(Array& array)
 void Base::replaceArray(Array& array, std::vector<Value>& elements)
 {
     ArrayLock::lockArray();
-    array.elements.clear();
-    array.elements.insert(array.elements.end(), std::make_move_iterator(elements.begin()),
-                          std::make_move_iterator(elements.end()));
+    array.elements.swap(elements);
     ArrayLock::unlockArray();
     elements.clear();
 }

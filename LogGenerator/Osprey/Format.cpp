@@ -37,20 +37,22 @@ void Format::write(std::string& out, std::int64_t value) const
 
 void Format::writeFixed(std::string& out, std::int64_t value) const
 {
-    const char* const sign = value < 0 ? "-" : "";
-    if (hasSixDecimals) {
-        const std::uint64_t millionths = rounded<1'000'000>(value);
-        return writeLong(out,
-                         fmt::format("{}{}.{:06}", sign, millionths / 1'000'000, millionths % 1'000'000));
-    }
-    const std::uint64_t hundredths = rounded<100>(value);
-    if (hundredths >= 1'000'000 || !leavesRoomFor(8)) [[unlikely]]
-        return writeLong(out, fmt::format("{}{}.{:02}", sign, hundredths / 100, hundredths % 100));
+    constexpr std::uint64_t kPackedWhole = 10'000;
+    const std::uint64_t unit = hasSixDecimals ? 1'000'000 : 100;
+    const std::uint64_t parts = hasSixDecimals ? rounded<1'000'000>(value) : rounded<100>(value);
+    if (parts >= kPackedWhole * unit || !leavesRoomFor(hasSixDecimals ? 12 : 8)) [[unlikely]]
+        return writeLong(out, fmt::format("{}{}.{:0{}}", value < 0 ? "-" : "", parts / unit, parts % unit,
+                                          hasSixDecimals ? 6 : 2));
     PackedText text = prefix;
     if (value < 0)
         text.append('-', 1);
-    text.appendNumber(static_cast<std::uint32_t>(hundredths) / 100);
-    text.appendHundredths(static_cast<std::uint32_t>(hundredths) % 100);
+    if (hasSixDecimals) {
+        text.appendNumber(static_cast<std::uint32_t>(parts / 1'000'000));
+        text.appendMillionths(static_cast<std::uint32_t>(parts % 1'000'000));
+    } else {
+        text.appendNumber(static_cast<std::uint32_t>(parts) / 100);
+        text.appendHundredths(static_cast<std::uint32_t>(parts) % 100);
+    }
     text.append(suffix);
     text.storeInto(out);
 }

@@ -58,6 +58,12 @@ public:
     /// A point and `value` as two digits; value below 100.
     constexpr void appendHundredths(std::uint32_t value) { append('.' | two(value) << 8, 3); }
 
+    /// A point and `value` as six digits; value below 1,000,000.
+    constexpr void appendMillionths(std::uint32_t value)
+    {
+        append('.' | two(value / 10'000) << 8 | two(value / 100 % 100) << 24 | two(value % 100) << 40, 7);
+    }
+
     /// Makes `out` this text.
     void storeInto(std::string& out) const
     {

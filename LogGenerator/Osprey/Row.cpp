@@ -24,6 +24,15 @@ bool writeRow(const Row& row, PacketView data, Value& out)
     return true;
 }
 
+void writeNumber(const Format& format, std::int64_t shown, Value& out)
+{
+    const Value::Origin origin{&format, shown};
+    if (out.isMadeFrom(origin))
+        return;
+    format.write(out.text(), shown);
+    out.setOrigin(origin);
+}
+
 void showRows(Dictionary& entry, std::span<const Row> rows, PacketView data)
 {
     std::size_t place = 0; // templates list the rows in the order of the tables

@@ -97,6 +97,9 @@ constexpr Row text(Label label, Field field, TextTable texts, std::string_view o
 /// that shows the same already. False when the row has nothing to show.
 bool writeRow(const Row& row, PacketView data, Value& out);
 
+/// Writes a number that is no field, likewise; `format` lives as long as the program.
+void writeNumber(const Format& format, std::int64_t shown, Value& out);
+
 /// Sets the rows of a keyed entry: adds or overwrites, removes nothing.
 void showRows(Dictionary& entry, std::span<const Row> rows, PacketView data);
 

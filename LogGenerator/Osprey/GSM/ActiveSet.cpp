@@ -32,8 +32,8 @@ void showCells(TableSection& section, const LogPacket& data)
             return false;
         const std::int64_t energy = energyPerChip(data.record(measurements, index, count));
         rows.show(kCellRows, cell);
-        kDecibels.write(rows.next("RSCP").text(), power + energy);
-        kDecibels.write(rows.next("Energy Per Chip").text(), energy);
+        writeNumber(kDecibels, power + energy, rows.next("RSCP"));
+        writeNumber(kDecibels, energy, rows.next("Energy Per Chip"));
         return true;
     });
 }

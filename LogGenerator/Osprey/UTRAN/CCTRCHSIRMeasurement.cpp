@@ -22,8 +22,8 @@ void showSirValues(Value& row, PacketView channel)
     auto& texts = row.array()->elements;
     texts.resize(Channel::sirCount);
     for (std::size_t position = 0; position < Channel::sirCount; ++position)
-        kSir.write(texts[position].text(),
-                   channel.record(Channel::sirValues, position, Channel::sirCount)[Channel::sir]);
+        writeNumber(kSir, channel.record(Channel::sirValues, position, Channel::sirCount)[Channel::sir],
+                    texts[position]);
 }
 
 void showChannels(TableSection& section, const LogPacket& data)
