@@ -102,7 +102,7 @@ int extract(const Data& dlf, const SnapshotOptions& options)
 {
     if (!dlf)
         return fail(options.snapshot, "carries no DLF file");
-    std::ofstream file(options.extractDlf, std::ios::binary | std::ios::trunc);
+    std::ofstream file(options.extractDlf, std::ofstream::binary | std::ofstream::trunc);
     file.write(reinterpret_cast<const char*>(dlf->data()), static_cast<std::streamsize>(dlf->size()));
     file.close();
     return file ? kSuccess : fail(options.extractDlf, std::strerror(errno));

@@ -1,8 +1,8 @@
+#include "platform/linux/SignalWatch.h"
 #include "telephonyd/Options.h"
 #include "telephonyd/server/ReplaySource.h"
 #include "telephonyd/server/SimulationSource.h"
 #include "telephonyd/server/TelephonyServer.h"
-#include "telephonyd/server/TerminationSignals.h"
 
 #include <QCoreApplication>
 #include <filesystem>
@@ -91,6 +91,6 @@ int main(int argumentCount, char** arguments)
         return fail("--modem: this version cannot read a modem");
     raiseDescriptorLimit();
     QCoreApplication application(argumentCount, arguments);
-    const TerminationSignals signals([] { QCoreApplication::quit(); });
+    const SignalWatch signals({SIGINT, SIGTERM}, [](int) { QCoreApplication::quit(); });
     return serve(*options);
 }

@@ -27,7 +27,7 @@ std::string PortDirectory::locate()
 {
     if (const char* chosen = std::getenv("PELORUS_PORT_DIRECTORY"); chosen && *chosen)
         return std::filesystem::absolute(chosen).string();
-    // A relative path there is to be ignored (XDG Base Directory Specification).
+    // A relative path there is to be ignored (XDG base directories).
     if (const char* runtime = std::getenv("XDG_RUNTIME_DIR"); runtime && *runtime == '/')
         return withoutTrailingSlashes(runtime) + "/pelorus";
     return fmt::format("/tmp/pelorus-{}", ::getuid());

@@ -1,7 +1,6 @@
 #include "platform/linux/SignalWatch.h"
 
 #include <QSocketNotifier>
-#include <csignal>
 #include <sys/signalfd.h>
 #include <unistd.h>
 
@@ -14,22 +13,22 @@ SignalWatch::SignalWatch(std::initializer_list<int> signals, std::function<void(
     sigemptyset(&set);
     for (const int signal : signals)
         sigaddset(&set, signal);
-    sigprocmask(SIG_BLOCK, &set, nullptr);
-    descriptor = signalfd(-1, &set, SFD_NONBLOCK | SFD_CLOEXEC);
-    notifier = std::make_unique<QSocketNotifier>(descriptor, QSocketNotifier::Read);
+    pthread_sigmask(SIG_BLOCK, &set, &before);
+    descriptor = FileDescriptor(signalfd(-1, &set, SFD_NONBLOCK | SFD_CLOEXEC));
+    notifier = std::make_unique<QSocketNotifier>(descriptor.get(), QSocketNotifier::Read);
     QObject::connect(notifier.get(), &QSocketNotifier::activated, [this] { deliver(); });
 }
 
 SignalWatch::~SignalWatch()
 {
     notifier.reset();
-    close(descriptor);
+    pthread_sigmask(SIG_SETMASK, &before, nullptr);
 }
 
 void SignalWatch::deliver()
 {
     signalfd_siginfo information{};
-    while (read(descriptor, &information, sizeof information) == sizeof information)
+    while (read(descriptor.get(), &information, sizeof information) == sizeof information)
         received(static_cast<int>(information.ssi_signo));
 }
 

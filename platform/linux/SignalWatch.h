@@ -1,6 +1,8 @@
 #pragma once
 
-#include <QObject>
+#include "platform/linux/FileDescriptor.h"
+
+#include <csignal>
 #include <functional>
 #include <initializer_list>
 #include <memory>
@@ -9,7 +11,8 @@ class QSocketNotifier;
 
 namespace pelorus {
 
-/// Delivers signals on the event loop, where anything may be done about them.
+/// Delivers signals on the event loop, where anything may be done about them, also those that come before it
+/// runs. Make it before any thread starts; when it goes, the signals do what they did before.
 class SignalWatch {
 public:
     SignalWatch(std::initializer_list<int> signals, std::function<void(int signal)> callback);
@@ -21,7 +24,8 @@ private:
     void deliver();
 
     std::function<void(int)> received;
-    int descriptor = -1;
+    sigset_t before{}; // the signals that were blocked
+    FileDescriptor descriptor;
     std::unique_ptr<QSocketNotifier> notifier;
 };
 

@@ -22,7 +22,7 @@ fs::path homeDirectory()
 
 fs::path stateDirectory()
 {
-    // A relative path there is to be ignored (XDG Base Directory Specification).
+    // A relative path there is to be ignored (XDG base directories).
     if (const char* state = std::getenv("XDG_STATE_HOME"); state && *state == '/')
         return state;
     return homeDirectory() / ".local" / "state";

@@ -331,7 +331,7 @@ std::optional<Bytes> ScriptedPlatform::readFile(const std::string& path)
         return found->second;
     if (!fileExists(path))
         return std::nullopt;
-    std::ifstream file(path, std::ios::binary);
+    std::ifstream file(path, std::ifstream::binary);
     return toBytes(std::string(std::istreambuf_iterator<char>(file), {}));
 }
 

@@ -36,7 +36,8 @@ constexpr std::array<Cell, LteSurroundings::kCells> kTable = {{
 constexpr ReselectionCandidate kCdma = {
     .technology = Technology::cdma1x, .priority = 2, .channel = 600, .identity = 0x0101, .band = 1};
 
-constexpr int kWeakestUtran = -112; // dBm; weaker ones are not found
+constexpr double kStrongest = -42.0; // dBm; below a mast the antenna looks over the road
+constexpr int kWeakestUtran = -112;  // dBm; weaker ones are not found
 constexpr int kWeakestGeran = -104;
 constexpr int kWeakestMeasured = -100; // weaker ones are found, but not measured
 
@@ -59,7 +60,7 @@ double levelAt(Point where, const Cell& cell, Random& random)
     const double north = where.y - cell.mast.y;
     const double metres = std::max(std::sqrt(east * east + north * north), 35.0);
     const double nearby = cell.technology == Technology::utran ? -58.0 : -50.0; // at 100 m
-    return nearby - 36.0 * std::log10(metres / 100.0) + 5.0 * random.normal();
+    return std::min(nearby - 36.0 * std::log10(metres / 100.0) + 5.0 * random.normal(), kStrongest);
 }
 
 } // namespace

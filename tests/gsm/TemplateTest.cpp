@@ -13,7 +13,7 @@ using testing::ElementsAre;
 
 std::string templateText()
 {
-    std::ifstream file(PELORUS_SOURCE_DIR "/resources/OSP_GSM.plist", std::ios::binary);
+    std::ifstream file(PELORUS_SOURCE_DIR "/resources/OSP_GSM.plist", std::ifstream::binary);
     return {std::istreambuf_iterator<char>(file), {}};
 }
 

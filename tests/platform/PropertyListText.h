@@ -33,8 +33,8 @@ inline std::string serialized(const Value& value, PropertyListForm form)
 }
 
 inline constexpr std::string_view kXmlHeader = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
-                                               "<!DOCTYPE plist PUBLIC \"-//Apple//DTD PLIST 1.0//EN\" "
-                                               "\"http://www.apple.com/DTDs/PropertyList-1.0.dtd\">\n"
+                                               "<!DOCTYPE plist PUBLIC \"-//Example//DTD PLIST 1.0//EN\" "
+                                               "\"http://example.com/PropertyList-1.0.dtd\">\n"
                                                "<plist version=\"1.0\">\n";
 
 inline Date dateAt(std::int64_t secondsSince1970, std::int64_t microseconds = 0)

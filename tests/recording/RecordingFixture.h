@@ -27,7 +27,7 @@ protected:
     {
         const std::string path = directory / name;
         std::filesystem::remove(path); // a new file is not flushed to the disk as one cut to nothing is
-        std::ofstream file(path, std::ios::binary);
+        std::ofstream file(path, std::ofstream::binary);
         file.write(reinterpret_cast<const char*>(content.data()),
                    static_cast<std::streamsize>(content.size()));
         return path;

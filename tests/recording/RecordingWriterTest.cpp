@@ -35,7 +35,7 @@ TEST_F(Writer, RoundTripKeepsBytesAndNanoseconds)
 TEST_F(Writer, FileIsANanosecondPcapOfUser0)
 {
     create().reset();
-    std::ifstream file(path, std::ios::binary);
+    std::ifstream file(path, std::ifstream::binary);
     std::array<unsigned char, 64> bytes{};
     file.read(reinterpret_cast<char*>(bytes.data()), bytes.size());
     EXPECT_EQ(file.gcount(), 24);
