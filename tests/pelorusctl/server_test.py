@@ -1,0 +1,170 @@
+#!/usr/bin/env python3
+"""pelorus-telephonyd from outside: clients that know nothing of it but its ports."""
+
+import os
+import plistlib
+import signal
+import struct
+import subprocess
+
+from programs import PELORUSCTL, TELEPHONYD, Scratch, ctl, main
+from recordings import LTE_ANTENNAS, START, lte_cell, message, pcap
+from telephony import LOCAL_PORT, ONE_WAY, REPLY, REQUEST, connect, frame, listen, receive
+
+START_COMMAND = {"SetState": "Streaming", "SetOspreyLogCodes": [0xB0C1, 0xB0C2, 0xB179, 0xB17F, 0xB180, 0xB186],
+                 "SetCtExtraCodes": [0, 1, 2]}
+
+
+class Client:
+    """A monitor's end of a channel, made on the port of that name."""
+
+    def __init__(self, directory, name):
+        listener = listen(directory, name)
+        server = connect(directory, "io.pelorus.TelephonyServer")
+        server.sendall(frame(plistlib.dumps({"CreateLogChannel": name}), REQUEST, 7, 1))
+        payload, message_id, kind, sequence = receive(server)
+        assert (message_id, kind, sequence) == (1, REPLY, 7), (message_id, kind, sequence)
+        answer = plistlib.loads(payload)
+        assert answer["Error"] == 0, answer
+        self.commands = connect(directory, answer["RemotePort"])
+        self.data = listener.accept()[0]
+        self.data.settimeout(10)
+        listener.close()
+        os.unlink(os.path.join(directory, name))
+        server.close()
+
+    def technology(self):
+        self.commands.sendall(frame(plistlib.dumps({"GetTechnology": "GetTechnology"}), REQUEST, 9))
+        payload, _, kind, sequence = receive(self.commands)
+        assert (kind, sequence) == (REPLY, 9)
+        return plistlib.loads(payload)["GetTechnology"]
+
+    def start(self):
+        self.commands.sendall(frame(plistlib.dumps(START_COMMAND)))
+
+    def messages(self, count):
+        received = []
+        for _ in range(count):
+            payload, message_id, kind, _ = receive(self.data)
+            assert (message_id, kind) == (0, ONE_WAY)
+            received.append(payload)
+        return received
+
+    def close(self):
+        self.data.close()
+        self.commands.close()
+
+
+def recorded(content):
+    """The messages of a pcap file in this machine's byte order."""
+    offset, messages = 24, []
+    while offset < len(content):
+        length = struct.unpack_from("<I", content, offset + 8)[0]
+        messages.append(content[offset + 16:offset + 16 + length])
+        offset += 16 + length
+    return messages
+
+
+def without_time(data):
+    """A message without its time stamp."""
+    return data[:5] + data[13:]
+
+
+class ServerTest(Scratch):
+    def setUp(self):
+        super().setUp()
+        os.mkdir(self.path("ports"), 0o700)
+        self.environment = dict(os.environ, PELORUS_PORT_DIRECTORY=self.path("ports"))
+
+    def serve(self, *arguments):
+        server = subprocess.Popen([TELEPHONYD, *arguments], env=self.environment, stderr=subprocess.PIPE, text=True)
+        self.addCleanup(server.stderr.close)
+        self.addCleanup(server.wait)
+        self.addCleanup(server.kill)
+        self.assertEqual(server.stderr.readline(),
+                         "listening on %s/io.pelorus.TelephonyServer\n" % self.path("ports"))
+        return server
+
+    def end(self, server, number=signal.SIGTERM):
+        server.send_signal(number)
+        self.assertEqual(server.wait(10), 0)
+        self.assertEqual(os.listdir(self.path("ports")), [])
+
+    def client(self, name=LOCAL_PORT):
+        client = Client(self.path("ports"), name)
+        self.addCleanup(client.close)
+        return client
+
+    def test_replays_to_several_at_once_and_records(self):
+        wanted = [lte_cell(1), b"\x81\x00" + lte_cell(2), LTE_ANTENNAS]
+        unwanted = [message(0xB0C0, 38), b"short", message(0xB0C2, 38, log_type=3)]
+        times = range(START * 10**9, START * 10**9 + 6000, 1000)
+        recording = self.write("recording", pcap(zip(times, [data for pair in zip(wanted, unwanted) for data in pair])))
+        server = self.serve("--replay", recording, "--technology", "Osprey LTE", "--record", self.path("record"))
+        clients = [self.client("test.Local%d" % number) for number in range(3)]
+        for client in clients:
+            self.assertEqual(client.technology(), "Osprey LTE")
+            client.start()
+        for client in clients:
+            self.assertEqual(client.messages(3), wanted)
+            client.close()
+        self.end(server)
+        self.assertEqual(sorted(recorded(self.read("record"))), sorted(3 * wanted))
+        again = ctl("decode", "--technology", "Osprey LTE", self.path("record"))
+        self.assertIn("Num Tx Antennas: 2\n", again.stdout)
+
+    def test_tells_the_same_story_for_the_same_seed(self):
+        stories = []
+        for seed in ("5", "5", "6"):
+            server = self.serve("--simulate", "Osprey LTE", "--seed", seed, "--rate", "1000")
+            client = self.client()
+            client.start()
+            stories.append([without_time(data) for data in client.messages(300)])
+            client.close()
+            self.end(server, signal.SIGINT)
+        self.assertEqual(stories[0], stories[1])
+        self.assertNotEqual(stories[0], stories[2])
+
+    def test_serves_the_monitor(self):
+        server = self.serve("--simulate", "Osprey LTE", "--rate", "500", "--record", self.path("record"))
+        run = subprocess.run([PELORUSCTL, "live", "--count", "1"], env=self.environment, capture_output=True,
+                             text=True, timeout=20, check=False)
+        self.assertEqual((run.returncode, run.stderr), (0, ""))
+        self.assertRegex(run.stdout, r"\n +Physical Cell ID: \d+\n")
+        self.end(server)
+        decoded = ctl("decode", "--technology", "Osprey LTE", self.path("record"))
+        self.assertEqual(decoded.returncode, 0)
+        self.assertRegex(decoded.stdout, r"\n +Physical Cell ID: \d+\n")
+
+    def test_a_second_one_gives_way(self):
+        server = self.serve("--simulate", "Osprey LTE")
+        second = subprocess.run([TELEPHONYD, "--simulate", "Osprey LTE"], env=self.environment, capture_output=True,
+                                text=True, timeout=10, check=False)
+        self.assertEqual((second.returncode, second.stdout, second.stderr.count("\n")), (1, "", 1))
+        self.assertIn(self.path("ports"), second.stderr)
+        self.assertEqual(self.client().technology(), "Osprey LTE")
+        self.end(server)
+
+    def test_takes_the_place_of_one_that_was_killed(self):
+        server = self.serve("--simulate", "Osprey LTE")
+        server.kill()
+        server.wait()
+        self.assertEqual(os.listdir(self.path("ports")), ["io.pelorus.TelephonyServer"])
+        self.end(self.serve("--simulate", "Osprey LTE"))
+
+    def test_ends_with_a_status_that_tells_why(self):
+        os.chmod(self.path("ports"), 0o777)
+        for status, culprit, arguments in (
+                (1, self.path("ports"), ["--simulate", "Osprey LTE"]),
+                (1, "/missing", ["--replay", "/missing", "--technology", "IFX"]),
+                (2, "", []), (2, "", ["--simulate", "LTE"]), (2, "--technology", ["--replay", "/missing"]),
+                (2, "", ["--simulate", "Osprey LTE", "--replay", "/missing", "--technology", "IFX"]),
+                (2, "", ["--simulate", "Osprey LTE", "--speed", "-1"])):
+            run = subprocess.run([TELEPHONYD, *arguments], env=self.environment, capture_output=True, text=True,
+                                 timeout=10, check=False)
+            self.assertEqual((run.returncode, run.stdout), (status, ""), arguments)
+            self.assertIn(culprit, run.stderr)
+
+
+if __name__ == "__main__":
+    main()
