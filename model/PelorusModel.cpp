@@ -206,6 +206,7 @@ void PelorusModel::announceConnection()
 void PelorusModel::updateWithData(std::span<const std::byte> data)
 {
     unrecorded = true; // at once: the message that ends the program counts too
+    lastMessage = platform.now();
     if (logGenerator)
         logGenerator->updateState(*state, data);
     updated = true;

@@ -4,7 +4,9 @@
 #include "model/PelorusModelNode.h"
 #include "platform/Platform.h"
 
+#include <chrono>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -36,6 +38,8 @@ public:
     bool isConnected() const { return recvPort && sendPort; }
 
     void updateWithData(std::span<const std::byte> data);
+    /// When the last message came; nothing before the first.
+    std::optional<std::chrono::system_clock::time_point> lastMessageTime() const { return lastMessage; }
     void refresh();
 
     /// The root of the display tree, null without a generator. Builds the tree, and with it a history entry,
@@ -66,6 +70,7 @@ private:
     bool updated = false;
     bool unrecorded = false; // messages arrived that no history entry holds
     bool announcedConnection = false;
+    std::optional<std::chrono::system_clock::time_point> lastMessage;
     std::unique_ptr<LogGenerator> logGenerator;
     std::shared_ptr<State> state = std::make_shared<State>();
     std::shared_ptr<const PelorusModelNode> nodes;

@@ -15,8 +15,8 @@ using PelorusModelNodes = std::vector<std::shared_ptr<const PelorusModelNode>>;
 /// Path ("/", "/GSM", "/GSM/Cell") to node.
 using PathDictionary = std::unordered_map<std::string, std::shared_ptr<const PelorusModelNode>>;
 
-/// Makes a node's path its child's: "/" and "GSM" give "/GSM", that and "Cell" give "/GSM/Cell". A name that holds a
-/// slash keeps it.
+/// Makes a node's path its child's: "/" and "GSM" give "/GSM", that and "Cell" give "/GSM/Cell". A name that
+/// holds a slash keeps it.
 void appendPathComponent(std::string& path, std::string_view name);
 
 /// One node of the display tree; it never changes. A leaf has a value and no children, an inner node has

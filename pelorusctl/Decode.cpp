@@ -37,15 +37,16 @@ public:
 int decode(const DecodeOptions& options)
 {
     std::string why;
-    std::unique_ptr<FileLogSink> log;
-    if (!options.systemLog.empty() && !(log = FileLogSink::open(options.systemLog, why)))
-        return fail(options.systemLog, why);
     const auto recording = RecordingReader::open(options.recording, why);
     if (!recording)
         return fail(options.recording, why);
-
     if (!options.resources.empty() && !isDirectory(options.resources))
         return fail(options.resources, "no directory");
+    if (isSameFile(options.systemLog, options.recording)) // it would be emptied before it is read
+        return fail(options.systemLog, "is the recording, and cannot be the system log too");
+    std::unique_ptr<FileLogSink> log;
+    if (!options.systemLog.empty() && !(log = FileLogSink::open(options.systemLog, why)))
+        return fail(options.systemLog, why);
     const ChosenSink chosenSink(log.get());
     LinuxPlatform platform({options.resources, false});
     OfflineMonitor monitor(LogGenerator::generatorFromTechnology(platform, options.technology),

@@ -68,7 +68,7 @@ public:
         if (!root)
             return;
         if (!onScreen) {
-            print(options.json ? treeJson(*root, platform.now()) : treeText(*root));
+            print(options.json ? treeJson(*root, model.lastMessageTime()) : treeText(*root));
         } else {
             view.setTree(*root);
             if (model.isConnected())

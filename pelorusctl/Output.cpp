@@ -1,5 +1,7 @@
 #include "pelorusctl/Output.h"
 
+#include "pelorusctl/TreeOutput.h"
+
 #include <cerrno>
 #include <cstdio>
 #include <cstring>
@@ -27,7 +29,7 @@ int finishOutput(int status)
 
 int fail(std::string_view name, std::string_view why)
 {
-    fmt::print(stderr, "pelorusctl: {}: {}\n", name, why);
+    fmt::print(stderr, "pelorusctl: {}: {}\n", printable(name), printable(why)); // one line whatever the name
     return kUnreadable;
 }
 
@@ -35,6 +37,12 @@ bool isDirectory(const std::string& path)
 {
     std::error_code none;
     return std::filesystem::is_directory(path, none);
+}
+
+bool isSameFile(const std::string& one, const std::string& other)
+{
+    std::error_code none;
+    return std::filesystem::equivalent(one, other, none);
 }
 
 } // namespace pelorus

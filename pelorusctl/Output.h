@@ -17,5 +17,7 @@ int finishOutput(int status);
 int fail(std::string_view name, std::string_view why);
 
 bool isDirectory(const std::string& path);
+/// Whether both exist and are one.
+bool isSameFile(const std::string& one, const std::string& other);
 
 } // namespace pelorus
