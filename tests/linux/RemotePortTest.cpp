@@ -173,6 +173,7 @@ TEST_F(RemotePortTest, SendThatThePeerDoesNotTakeInTimeIsMinusOne)
     timedOut.set_value();
     EXPECT_EQ(textOf(send("third", 0s)), "status 0, nothing");
     port.reset();
+    server.reset(); // its thread uses what is local here
 }
 
 TEST_F(RemotePortTest, LargestMessageGoesThroughAndOneMoreByteDoesNot)
