@@ -63,7 +63,7 @@ void receive(benchmark::State& run)
 {
     const bench::MessageStream stream("Osprey LTE", kMessages);
     const auto frames = framed(stream);
-    LinuxPlatform platform({PELORUS_SOURCE_DIR "/resources", false});
+    LinuxPlatform platform(PELORUS_SOURCE_DIR "/resources");
     const auto generator = LogGenerator::generatorFromTechnology(platform, "Osprey LTE");
     State state;
     const bool decodes = run.range(0) != 0;

@@ -48,7 +48,7 @@ int decode(const DecodeOptions& options)
     if (!options.systemLog.empty() && !(log = FileLogSink::open(options.systemLog, why)))
         return fail(options.systemLog, why);
     const ChosenSink chosenSink(log.get());
-    LinuxPlatform platform({options.resources, false});
+    LinuxPlatform platform(options.resources);
     OfflineMonitor monitor(LogGenerator::generatorFromTechnology(platform, options.technology),
                            interval(options),
                            [&options](const PelorusModelNode& root, std::optional<RecordedTime> lastMessage) {

@@ -161,7 +161,7 @@ int live(const LiveOptions& options)
         return fail("live", why);
     SyslogSink log("pelorusctl");
     setSystemLogSink(&log);
-    LinuxPlatform platform({{}, false});
+    LinuxPlatform platform;
     {
         LiveView view(options, platform);
         const SignalWatch signals({SIGINT, SIGTERM, SIGHUP, SIGWINCH, SIGTSTP, SIGCONT},

@@ -10,7 +10,7 @@ int startCommand(const StartCommandOptions& options)
 {
     if (!options.resources.empty() && !isDirectory(options.resources))
         return fail(options.resources, "no directory");
-    LinuxPlatform platform({options.resources, false});
+    LinuxPlatform platform(options.resources);
     const auto generator = LogGenerator::generatorFromTechnology(platform, options.technology);
     const auto command = serializePropertyList(generator->getStartCommand());
     if (!command)

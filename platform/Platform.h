@@ -118,9 +118,6 @@ public:
     virtual bool writePropertyList(const Value& value, const std::string& path) = 0;
     /// Where snapshot files go; made when it is missing.
     virtual std::string snapshotDirectory() = 0;
-
-    // Console.
-    virtual void consoleLine(std::string_view text) = 0;
 };
 
 /// A moment in a date's default textual form, which is UTC: "2012-05-04 09:30:00 +0000".

@@ -16,12 +16,10 @@
 
 namespace pelorus {
 
-LinuxPlatform::LinuxPlatform() : LinuxPlatform(Options()) {}
-
-LinuxPlatform::LinuxPlatform(Options options)
-    : resources(options.resourceDirectory.empty() ? ResourceDirectory::besideThisProgram()
-                                                  : ResourceDirectory(options.resourceDirectory)),
-      console(options.console), mainQueue(std::make_unique<QObject>())
+LinuxPlatform::LinuxPlatform(const std::string& resourceDirectory)
+    : resources(resourceDirectory.empty() ? ResourceDirectory::besideThisProgram()
+                                          : ResourceDirectory(resourceDirectory)),
+      mainQueue(std::make_unique<QObject>())
 {}
 
 LinuxPlatform::~LinuxPlatform() = default;
@@ -161,15 +159,6 @@ bool LinuxPlatform::writePropertyList(const Value& value, const std::string& pat
 std::string LinuxPlatform::snapshotDirectory()
 {
     return findSnapshotDirectory();
-}
-
-void LinuxPlatform::consoleLine(std::string_view text)
-{
-    if (!console)
-        return;
-    std::fwrite(text.data(), 1, text.size(), stdout);
-    if (!text.ends_with('\n'))
-        std::fputc('\n', stdout);
 }
 
 std::optional<PortDirectory> LinuxPlatform::openPortDirectory()

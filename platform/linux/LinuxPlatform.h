@@ -13,15 +13,8 @@ namespace pelorus {
 /// may outlive it, but then do nothing any more.
 class LinuxPlatform : public Platform {
 public:
-    struct Options {
-        /// Where property-list resources are; empty: beside the program.
-        std::string resourceDirectory = {};
-        /// False: console lines are dropped.
-        bool console = true;
-    };
-
-    LinuxPlatform();
-    explicit LinuxPlatform(Options options);
+    /// Property-list resources are in that directory; empty: beside the program.
+    explicit LinuxPlatform(const std::string& resourceDirectory = {});
     ~LinuxPlatform() override;
 
     LocalPort createLocalMessagePort(const std::string& name, PortMessageCallback callback) override;
@@ -54,15 +47,12 @@ public:
     bool writePropertyList(const Value& value, const std::string& path) override;
     std::string snapshotDirectory() override;
 
-    void consoleLine(std::string_view text) override;
-
 private:
     std::optional<PortDirectory> openPortDirectory();
     /// Says once why ports cannot be used, not at each of the retries that follow.
     void reportPortTrouble(const std::string& why);
 
     ResourceDirectory resources;
-    bool console;
     std::unique_ptr<QObject> mainQueue; // what is queued or timed goes with it
     std::string reportedTrouble;
 };

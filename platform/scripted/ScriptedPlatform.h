@@ -88,7 +88,6 @@ public:
     std::vector<SentMessage> sent;
     std::optional<Bytes> lastReply;
     std::map<std::string, Value> written; // deep copies of the property lists, by path
-    std::vector<std::string> consoleLines;
     std::chrono::nanoseconds elapsed{0};
     /// The port made last, null when it is gone.
     std::shared_ptr<ScriptedPort> localPort() const { return lastLocalPort.lock(); }
@@ -120,7 +119,6 @@ public:
     std::optional<Bytes> readFile(const std::string& path) override;
     bool writePropertyList(const Value& value, const std::string& path) override;
     std::string snapshotDirectory() override { return crashReports; }
-    void consoleLine(std::string_view text) override { consoleLines.emplace_back(text); }
 
 private:
     struct Schedule;

@@ -132,13 +132,4 @@ TEST_F(FilesTest, LocalZoneCountsTheDaylightSavingHour)
     ::tzset();
 }
 
-TEST_F(FilesTest, ConsoleLinesGoToStandardOutputOrNowhere)
-{
-    testing::internal::CaptureStdout();
-    platform.consoleLine("one");
-    platform.consoleLine("two\n");
-    LinuxPlatform({.console = false}).consoleLine("dropped");
-    EXPECT_EQ(testing::internal::GetCapturedStdout(), "one\ntwo\n");
-}
-
 } // namespace pelorus

@@ -32,7 +32,7 @@ TEST_F(ResourceDirectoryTest, FindsByNameAndListsInOrder)
     for (const char* name : {"UTRAN.plist", "LTE.plist", "OSP_GSM.plist", "icon.svg", "sub/inner.plist"})
         make(name);
     QDir().mkdir(QString::fromStdString(below("folder.plist")));
-    LinuxPlatform platform({.resourceDirectory = base.path().toStdString()});
+    LinuxPlatform platform(base.path().toStdString());
     EXPECT_EQ(platform.findPropertyListResource("LTE"), below("LTE.plist"));
     EXPECT_THAT(platform.listPropertyListResources(),
                 ElementsAre(below("LTE.plist"), below("OSP_GSM.plist"), below("UTRAN.plist")));
@@ -42,7 +42,7 @@ TEST_F(ResourceDirectoryTest, FindsByNameAndListsInOrder)
 
 TEST_F(ResourceDirectoryTest, MissingDirectoryHasNone)
 {
-    LinuxPlatform platform({.resourceDirectory = below("missing")});
+    LinuxPlatform platform(below("missing"));
     EXPECT_FALSE(platform.findPropertyListResource("LTE"));
     EXPECT_THAT(platform.listPropertyListResources(), IsEmpty());
 }
