@@ -3,11 +3,9 @@
 add_library(pelorus_compile INTERFACE)
 target_include_directories(pelorus_compile INTERFACE ${PROJECT_SOURCE_DIR})
 target_compile_definitions(pelorus_compile INTERFACE QT_NO_KEYWORDS)
-target_compile_options(pelorus_compile INTERFACE -Wall -Wextra -Wpedantic -Wshadow=local -Wconversion
+target_compile_options(pelorus_compile INTERFACE -Wall -Wextra -Wpedantic
+                                                 $<$<CXX_COMPILER_ID:GNU>:-Wshadow=local> -Wconversion
                                                  -Wnon-virtual-dtor -Woverloaded-virtual -fno-math-errno)
-if(CMAKE_CXX_COMPILER_ID STREQUAL "Clang")
-  target_compile_options(pelorus_compile INTERFACE -Wno-shadow)
-endif()
 if(PELORUS_WARNINGS_AS_ERRORS)
   target_compile_options(pelorus_compile INTERFACE -Werror)
 endif()
