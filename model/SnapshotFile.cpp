@@ -17,15 +17,15 @@ Value snapshotFileContent(const std::string& timestamp, const std::shared_ptr<Ar
     return content;
 }
 
-bool writeSnapshotFile(Platform& platform, const Value& content)
+std::optional<std::string> writeSnapshotFile(Platform& platform, const Value& content)
 {
     const auto seconds = std::chrono::floor<std::chrono::seconds>(platform.now()).time_since_epoch().count();
     const std::string path =
         fmt::format("{}/PelorusSnapshot-{}.pelorus", platform.snapshotDirectory(), seconds);
     if (platform.writePropertyList(content, path))
-        return true;
+        return path;
     systemLog(kLogError, "Unable to write snapshot to %s", path);
-    return false;
+    return std::nullopt;
 }
 
 } // namespace pelorus

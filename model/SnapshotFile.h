@@ -9,8 +9,8 @@ namespace pelorus {
 Value snapshotFileContent(const std::string& timestamp, const std::shared_ptr<Array>& saveContents,
                           const std::string& description);
 
-/// Writes the content to the snapshot directory under the name of the current second. False, and a line in
-/// the system log, when that fails.
-bool writeSnapshotFile(Platform& platform, const Value& content);
+/// Writes the content to the snapshot directory under the name of the current second, and returns its path.
+/// Nothing, and a line in the system log, when that fails.
+std::optional<std::string> writeSnapshotFile(Platform& platform, const Value& content);
 
 } // namespace pelorus

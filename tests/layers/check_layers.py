@@ -30,7 +30,9 @@ ALLOWED = {
     # Of the decoders only where the fields are.
     "telephonyd": [r'"telephonyd/.*"', r'"platform/.*"', r'"LogGenerator/(\w+/)*LogCode_\w+\.h"',
                    r'"LogGenerator/Osprey/(Field|CellMonitorKeys)\.h"', r"<.*>"],
-    "app": [r'"app/.*"', r'"model/.*"', r'"LogGenerator/.*"', r'"platform/.*"', r"<.*>"],
+    "app": [r'"app/.*"', r'"model/.*"', r'"platform/.*"', r'"ui_\w+\.h"', r"<.*>"],
+    # What the window shows and where is decided without the toolkit.
+    "app/content": [r'"app/content/.*"', r'"model/.*"', r'"platform/\w+\.h"', STANDARD, FMT],
 }
 # The property-list library, and the headers that show it, are for these alone.
 PROPERTY_LISTS = re.compile(r"platform/\w*(PropertyList|Plist)\w*\.(h|cpp)")

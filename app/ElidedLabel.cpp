@@ -1,0 +1,27 @@
+#include "app/ElidedLabel.h"
+
+#include <QPainter>
+#include <QStyle>
+
+namespace pelorus {
+
+ElidedLabel::ElidedLabel(QWidget* parent) : QLabel(parent)
+{
+    setTextFormat(Qt::PlainText);
+}
+
+QSize ElidedLabel::minimumSizeHint() const
+{
+    return {0, QLabel::minimumSizeHint().height()};
+}
+
+void ElidedLabel::paintEvent(QPaintEvent*)
+{
+    QPainter painter(this);
+    const QString line = QString(text()).replace(u'\n', u' ');
+    style()->drawItemText(&painter, contentsRect(), static_cast<int>(alignment()), palette(), isEnabled(),
+                          fontMetrics().elidedText(line, Qt::ElideRight, contentsRect().width()),
+                          foregroundRole());
+}
+
+} // namespace pelorus
