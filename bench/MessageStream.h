@@ -1,5 +1,6 @@
 #pragma once
 
+#include "bench/CdmaMix.h"
 #include "telephonyd/simulation/Simulation.h"
 
 #include <span>
@@ -17,10 +18,13 @@ public:
         SimulatedMessage message;
         for (std::size_t index = 0; index < count; ++index) {
             simulation->next(message);
-            starts.push_back(content.size());
-            content.insert(content.end(), message.bytes.begin(), message.bytes.end());
+            append(message.bytes);
         }
-        starts.push_back(content.size());
+    }
+    MessageStream(CdmaMix mix, std::size_t count)
+    {
+        for (std::size_t index = 0; index < count; ++index)
+            append(mix.next());
     }
 
     std::size_t size() const { return starts.size() - 1; }
@@ -32,8 +36,14 @@ public:
     std::span<const std::byte> bytes() const { return content; }
 
 private:
+    void append(std::span<const std::byte> message)
+    {
+        content.insert(content.end(), message.begin(), message.end());
+        starts.push_back(content.size());
+    }
+
     std::vector<std::byte> content;
-    std::vector<std::size_t> starts;
+    std::vector<std::size_t> starts{0}; // and the end of the last one
 };
 
 } // namespace pelorus::bench

@@ -13,16 +13,18 @@ namespace {
 using namespace pelorus;
 
 constexpr std::size_t kMessages = 100'000;
-constexpr const char* kTechnologies[] = {"Osprey LTE", "Osprey GSM", "Osprey UTRAN2"};
+constexpr const char* kTechnologies[] = {"Osprey LTE", "Osprey GSM", "Osprey UTRAN2", "Osprey CDMA"};
+constexpr std::int64_t kCdma = 3;
 
 const bench::MessageStream& streamOf(std::int64_t technology)
 {
     static std::map<std::int64_t, bench::MessageStream> streams;
     const auto found = streams.find(technology);
-    return found != streams.end()
-               ? found->second
-               : streams.emplace(technology, bench::MessageStream(kTechnologies[technology], kMessages))
-                     .first->second;
+    if (found != streams.end())
+        return found->second;
+    auto stream = technology == kCdma ? bench::MessageStream(bench::CdmaMix(), kMessages)
+                                      : bench::MessageStream(kTechnologies[technology], kMessages);
+    return streams.emplace(technology, std::move(stream)).first->second;
 }
 
 void count(benchmark::State& run, const bench::MessageStream& stream)
@@ -46,7 +48,7 @@ void walk(benchmark::State& run)
     }
     count(run, stream);
 }
-BENCHMARK(walk)->DenseRange(0, 2);
+BENCHMARK(walk)->DenseRange(0, kCdma);
 
 void decode(benchmark::State& run)
 {
@@ -62,7 +64,7 @@ void decode(benchmark::State& run)
     }
     count(run, stream);
 }
-BENCHMARK(decode)->DenseRange(0, 2)->Unit(benchmark::kMillisecond);
+BENCHMARK(decode)->DenseRange(0, kCdma)->Unit(benchmark::kMillisecond);
 
 } // namespace
 
