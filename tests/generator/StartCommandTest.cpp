@@ -1,3 +1,4 @@
+#include "LogGenerator/C2K/C2KLogGenerator.h"
 #include "LogGenerator/Osprey/GSM/OSP_GSMLogGenerator.h"
 #include "LogGenerator/Osprey/LTE/LTELogGenerator.h"
 #include "LogGenerator/Osprey/UTRAN/UTRANLogGenerator.h"
@@ -78,6 +79,15 @@ TEST_F(StartCommand, OfGSM)
                                      0x5076, 0x512C, 0x5134, 0x5137, 0x51F4, 0x51F5, 0x51F6, 0x51F8, 0x51FB,
                                      0x51FD, 0x51FF, 0x7130, 0x7131, 0x7132, 0x7135, 0x7150));
     EXPECT_THAT(codes(command, "SetCtExtraCodes"), UnorderedElementsAre(0, 1, 2));
+}
+
+TEST_F(StartCommand, OfCDMAHasItsCodesInOrderAndNoInternalOnes)
+{
+    const Value command = C2KLogGenerator::generator(platform)->getStartCommand();
+    EXPECT_EQ(command.dictionary()->size(), 2U);
+    EXPECT_EQ(command.dictionary()->at("SetState"), Value("Streaming"));
+    EXPECT_THAT(codes(command, "SetOspreyLogCodes"),
+                testing::ElementsAre(0x108A, 0x1183, 0x1192, 0x12B6, 0x119C, 0x119D, 0x127E, 0x134F));
 }
 
 } // namespace
