@@ -28,10 +28,14 @@ std::string_view className(const Value& object)
     return "Nil";
 }
 
-Value collapsed(Value object)
+/// What stands below a key or in an array for that object.
+Value shownBelow(const Value& object)
 {
-    Value only = GSMLogGenerator::canCollapse(object);
-    return only ? only : object;
+    if (object.string()) // nearly all are
+        return object;
+    Value shown = GSMLogGenerator::processObject(object);
+    Value only = GSMLogGenerator::canCollapse(shown);
+    return only ? only : shown;
 }
 
 } // namespace
@@ -54,7 +58,7 @@ Value GSMLogGenerator::processObject(const Value& object)
         auto shown = makeDictionary();
         shown->reserve(dictionary->size());
         for (const auto& [key, value] : *dictionary)
-            shown->append(key, collapsed(processObject(value)));
+            shown->append(key, shownBelow(value));
         return shown;
     }
     if (const Array* array = object.array()) {
@@ -62,7 +66,7 @@ Value GSMLogGenerator::processObject(const Value& object)
         shown->elements.reserve(array->elements.size());
         // The first element is never shown, whatever it is: meant.
         for (std::size_t index = 1; index < array->elements.size(); ++index)
-            shown->elements.push_back(collapsed(processObject(array->elements[index])));
+            shown->elements.push_back(shownBelow(array->elements[index]));
         return shown;
     }
     throw InternalInconsistencyException(
