@@ -1,5 +1,6 @@
 #include "telephonyd/simulation/Simulation.h"
 
+#include "telephonyd/simulation/CdmaHandset.h"
 #include "telephonyd/simulation/GsmHandset.h"
 #include "telephonyd/simulation/LteHandset.h"
 #include "telephonyd/simulation/UtranHandset.h"
@@ -20,6 +21,7 @@ template <class T> std::unique_ptr<Handset> make(std::uint64_t seed)
 
 constexpr Technology kTechnologies[] = {
     {"Osprey GSM", make<GsmHandset>},
+    {"Osprey CDMA", make<CdmaHandset>},
     {"Osprey LTE", make<LteHandset>},
     {"Osprey UTRAN2", make<UtranHandset>},
 };
