@@ -2,7 +2,17 @@
 
 #include "telephonyd/simulation/Units.h"
 
+#include <algorithm>
+
 namespace pelorus {
+
+namespace {
+
+using namespace std::chrono_literals;
+
+constexpr std::chrono::milliseconds kShortestStep = 20ms; // what it logs takes its time
+
+} // namespace
 
 CdmaHandset::CdmaHandset(std::uint64_t seed)
     : random(seed), journey(kRoad, random), radio(journey.position(), random), cdma(random), evdo(random)
@@ -79,8 +89,9 @@ void CdmaHandset::beginNext()
 void CdmaHandset::live()
 {
     Milliseconds until = std::min(cdma.wakes(now), evdo.wakes(now));
-    if (activity != Activity::returning && activityEnds > now)
-        until = std::min(until, activityEnds);
+    if (activityEnds > now)
+        until = std::min(until, std::max(activityEnds, now + CdmaSide::kTick));
+    until = std::max(until, now + kShortestStep);
     lastStep = until - now;
     now = until;
     journey.advance(inSeconds(lastStep), random);

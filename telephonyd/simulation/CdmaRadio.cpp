@@ -24,7 +24,7 @@ constexpr double kLoadMean = 0.45;
 constexpr double kLoadDeviation = 0.2;
 constexpr double kLoadMemory = 20.0; // seconds
 constexpr double kFilterMemory = 0.5;
-constexpr double kLowestStrength = -31.0; // what a searcher tells from noise
+constexpr double kLowestStrength = -24.0; // what a searcher tells from noise
 constexpr double kLowestLevel = -105.0;
 constexpr double kHighestLevel = -25.0;
 

@@ -28,9 +28,9 @@ constexpr double kLowestPower = -50.0;
 constexpr double kHighestPower = 23.5;
 constexpr double kPowerOff = -60.0;
 
-// Frames: the outer loop holds less than one error in a hundred as long as there is power for it.
-constexpr double kUsualErrorRate = 0.006;
-constexpr double kNeededStrength = -7.0; // dB, of all pilots together
+// Frames: the outer loop holds one error in a hundred or so as long as there is power for it.
+constexpr double kUsualErrorRate = 0.008;
+constexpr double kNeededStrength = -5.0; // dB, of all pilots together
 constexpr double kStrengthPerDecade = 4.0;
 constexpr double kHighestErrorRate = 0.4;
 
@@ -70,6 +70,14 @@ void CdmaSide::begin(Course next, Milliseconds now)
         pilots.clear();
         hasService = false;
     }
+}
+
+void CdmaSide::beginCall(Milliseconds now)
+{
+    constexpr std::size_t asleep = 2; // stages of a slot cycle
+    const bool isAwake = stages != asleep;
+    begin(Course::originating, now);
+    stages = isAwake ? 1 : 0;
 }
 
 CdmaSide::Milliseconds CdmaSide::wakes(Milliseconds now) const

@@ -19,8 +19,7 @@ public:
     void powerUp(Milliseconds now) { begin(Course::searching, now); }
     /// While it is neither searching nor in a call.
     bool isIdle() const { return course == Course::idle; }
-    bool isTalking() const { return course == Course::talking; }
-    void beginCall(Milliseconds now) { begin(Course::originating, now); }
+    void beginCall(Milliseconds now);
     void endCall(Milliseconds now) { begin(Course::searching, now); }
 
     /// One tick.

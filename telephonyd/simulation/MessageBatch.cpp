@@ -19,13 +19,18 @@ constexpr std::uint32_t kInternalCodes = 0xFF0000;
 
 } // namespace
 
-std::size_t MessageBatch::begin(std::uint32_t code, std::size_t length)
+std::size_t MessageBatch::append(std::uint32_t code, std::size_t length)
 {
     const std::size_t first = messages.empty() ? 0 : messages.back().start + messages.back().length;
     bytes.resize(first); // the slack behind the last message may be written to
     bytes.resize(first + length + PacketWriter::kSlack);
     messages.push_back({now, code, first, length});
+    return first;
+}
 
+std::size_t MessageBatch::begin(std::uint32_t code, std::size_t length)
+{
+    const std::size_t first = append(code, length);
     PacketWriter header(bytes, first);
     const std::uint64_t stamp = logTime(start + now);
     header.put(kLogType, code < kInternalCodes ? kBaseband : kTelephonyServer);
@@ -46,6 +51,12 @@ void MessageBatch::list(std::uint32_t code, std::span<const std::byte> propertyL
     const std::size_t first = begin(code, kHeaderLength + propertyList.size());
     std::copy(propertyList.begin(), propertyList.end(),
               bytes.begin() + static_cast<std::ptrdiff_t>(first + kHeaderLength));
+}
+
+void MessageBatch::bare(std::span<const std::byte> content)
+{
+    const std::size_t first = append(0, content.size());
+    std::copy(content.begin(), content.end(), bytes.begin() + static_cast<std::ptrdiff_t>(first));
 }
 
 SimulatedMessage MessageBatch::operator[](std::size_t index) const

@@ -10,7 +10,7 @@ namespace pelorus {
 /// One log message of a simulated handset.
 struct SimulatedMessage {
     std::chrono::nanoseconds time{}; // since the simulation began
-    std::uint32_t code = 0;          // of the log, 0xFF0000 and up for the telephony server's own
+    std::uint32_t code = 0;          // of the log, 0xFF0000 and up for the telephony server's own; 0 for none
     std::span<const std::byte> bytes;
 };
 
@@ -27,6 +27,8 @@ public:
     /// A packet of the telephony server itself: `code` is 0xFF0000 and up, a serialized property list its
     /// payload.
     void list(std::uint32_t code, std::span<const std::byte> propertyList);
+    /// A message without a header, of a baseband that knows no log codes; its code is 0.
+    void bare(std::span<const std::byte> content);
 
     std::size_t size() const { return messages.size(); }
     /// Valid until the batch changes.
@@ -41,6 +43,8 @@ private:
         std::size_t length;
     };
 
+    /// Makes room for a message behind the others; where it begins.
+    std::size_t append(std::uint32_t code, std::size_t length);
     std::size_t begin(std::uint32_t code, std::size_t length);
 
     HandsetTime start;

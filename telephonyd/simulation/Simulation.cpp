@@ -2,6 +2,7 @@
 
 #include "telephonyd/simulation/CdmaHandset.h"
 #include "telephonyd/simulation/GsmHandset.h"
+#include "telephonyd/simulation/IfxHandset.h"
 #include "telephonyd/simulation/LteHandset.h"
 #include "telephonyd/simulation/UtranHandset.h"
 
@@ -20,6 +21,7 @@ template <class T> std::unique_ptr<Handset> make(std::uint64_t seed)
 }
 
 constexpr Technology kTechnologies[] = {
+    {"IFX", make<IfxHandset>},
     {"Osprey GSM", make<GsmHandset>},
     {"Osprey CDMA", make<CdmaHandset>},
     {"Osprey LTE", make<LteHandset>},

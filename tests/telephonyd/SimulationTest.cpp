@@ -58,7 +58,9 @@ TEST(Simulation, StampsMessagesWithTheTimeOfTheHandset)
 
 TEST(Simulation, KnowsNoOtherTechnologies)
 {
-    EXPECT_EQ(Simulation::create("IFX", 1, kStart), nullptr);
+    for (const char* known : {"IFX", "Osprey GSM", "Osprey CDMA", "Osprey LTE", "Osprey UTRAN2"})
+        EXPECT_NE(Simulation::create(known, 1, kStart), nullptr) << known;
+    EXPECT_EQ(Simulation::create("ifx", 1, kStart), nullptr);
     EXPECT_EQ(Simulation::create("Osprey lte", 1, kStart), nullptr);
     EXPECT_EQ(Simulation::create("", 1, kStart), nullptr);
 }
