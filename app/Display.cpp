@@ -29,7 +29,8 @@ bool isSet(const char* variable)
 void onMessage(QtMsgType type, const QMessageLogContext&, const QString& text)
 {
     if (type == QtFatalMsg)
-        endProgram(fmt::format("no window can be opened on this display (DISPLAY is \"{}\", WAYLAND_DISPLAY \"{}\")",
+        endProgram(
+            fmt::format("no window can be opened on this display (DISPLAY is \"{}\", WAYLAND_DISPLAY \"{}\")",
                         qgetenv("DISPLAY").toStdString(), qgetenv("WAYLAND_DISPLAY").toStdString()));
     if (type == QtCriticalMsg)
         fmt::print(stderr, "{}\n", text.toStdString());

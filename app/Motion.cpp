@@ -17,6 +17,7 @@ void animate(QWidget& context, int duration, std::function<void(double)> move, s
         done();
         return;
     }
+    move(0);
     auto* animation = new QVariantAnimation(&context);
     animation->setStartValue(0.0);
     animation->setEndValue(1.0);
