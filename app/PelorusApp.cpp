@@ -1,8 +1,8 @@
 #include "app/PelorusApp.h"
 
+#include "app/Accessibility.h"
 #include "app/PelorusPaneController.h"
 #include "app/PelorusSaveViewController.h"
-#include "app/TableAccessibility.h"
 #include "app/Toolbar.h"
 #include "app/content/InternalBuildMarker.h"
 
@@ -24,7 +24,7 @@ PelorusApp::~PelorusApp() = default;
 
 void PelorusApp::applicationDidFinishLaunching()
 {
-    installTableAccessibility();
+    installAccessibility();
     getSaveButtonPref();
     window = std::make_unique<Window>();
     model = std::make_unique<PelorusModel>(platform, *this);

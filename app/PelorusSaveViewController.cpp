@@ -1,6 +1,7 @@
 #include "app/PelorusSaveViewController.h"
 
 #include "app/CheckMarkDelegate.h"
+#include "app/TextLabel.h"
 #include "app/content/SaveRows.h"
 #include "model/SnapshotFile.h"
 #include "ui_PelorusSaveViewController.h"
@@ -52,6 +53,14 @@ void PelorusSaveViewController::viewDidLoad()
     connect(new QShortcut(QKeySequence::Cancel, this), &QShortcut::activated, this,
             [this] { cancelPressed(); });
 
+    interface->titleLabel->setFont(systemFont(kCellFontSize + 1, QFont::DemiBold));
+    for (QWidget* widget :
+         std::initializer_list<QWidget*>{interface->cancelButton, interface->saveButton,
+                                         interface->descriptionLabel, interface->contentLabel})
+        widget->setFont(systemFont(kStatusFontSize));
+    saveDescription()->setFont(systemFont(kCellFontSize));
+    saveDescription()->setTextMargins(6, 0, 6, 0);
+
     QListWidget* table = saveContentTable();
     table->setFont(rowFont());
     table->setItemDelegate(new CheckMarkDelegate(table));
@@ -64,7 +73,7 @@ void PelorusSaveViewController::viewDidLoad()
     connect(table, &QListWidget::itemPressed, this, [this] { saveDescription()->clearFocus(); });
     table->setSizeAdjustPolicy(QAbstractScrollArea::AdjustToContents);
     table->setVisible(table->count() > 0);
-    interface->contentLabel->setText(table->count() > 0 ? tr("These are saved:")
+    interface->contentLabel->setText(table->count() > 0 ? tr("What is saved")
                                                         : tr("There is nothing to save yet."));
 }
 

@@ -1,6 +1,7 @@
 #include "app/TableView.h"
 
-#include "app/TableAccessibility.h"
+#include "app/Accessibility.h"
+#include "app/SlimScrollBar.h"
 
 #include <QScrollBar>
 #include <QScroller>
@@ -18,6 +19,7 @@ TableView::TableView(TableSource& shownSource, QWidget* parent)
     : QAbstractScrollArea(parent), source(shownSource)
 {
     setFrameShape(QFrame::NoFrame);
+    setVerticalScrollBar(new SlimScrollBar(Qt::Vertical));
     setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     setFocusPolicy(Qt::StrongFocus);
     viewport()->setBackgroundRole(QPalette::Base);

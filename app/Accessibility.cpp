@@ -1,5 +1,6 @@
-#include "app/TableAccessibility.h"
+#include "app/Accessibility.h"
 
+#include "app/ActivityIndicator.h"
 #include "app/TableView.h"
 
 #include <QAccessibleWidget>
@@ -125,13 +126,16 @@ private:
 
 QAccessibleInterface* makeInterface(const QString&, QObject* object)
 {
-    auto* table = dynamic_cast<TableView*>(object);
-    return table ? new TableInterface(*table) : nullptr;
+    if (auto* table = dynamic_cast<TableView*>(object))
+        return new TableInterface(*table);
+    if (auto* indicator = dynamic_cast<ActivityIndicator*>(object))
+        return new QAccessibleWidget(indicator, QAccessible::Animation);
+    return nullptr;
 }
 
 } // namespace
 
-void installTableAccessibility()
+void installAccessibility()
 {
     QAccessible::installFactory(makeInterface);
 }
