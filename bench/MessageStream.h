@@ -1,6 +1,5 @@
 #pragma once
 
-#include "bench/CdmaMix.h"
 #include "telephonyd/simulation/Simulation.h"
 
 #include <span>
@@ -20,11 +19,6 @@ public:
             simulation->next(message);
             append(message.bytes);
         }
-    }
-    MessageStream(CdmaMix mix, std::size_t count)
-    {
-        for (std::size_t index = 0; index < count; ++index)
-            append(mix.next());
     }
 
     std::size_t size() const { return starts.size() - 1; }

@@ -144,7 +144,12 @@ double CdmaSide::frameErrorRate(const CdmaCarrier& carrier) const
 void CdmaSide::talk(MessageBatch& log, const CdmaRadio& radio, Milliseconds now, Random& random)
 {
     const CdmaCarrier& carrier = radio.cdma();
+    const std::size_t reference = pilots.reference();
     pilots.update(carrier, inSeconds(kTick));
+    if (pilots.reference() != reference) { // the network says where it is now
+        writeCdmaSystem(log, pilots.reference());
+        log.setTime(log.time() + kBetweenMessages);
+    }
     if (ticks++ % kTicksPerState == 0) {
         const double level = kOpenLoop - carrier.levels[0] + kCorrection + kCorrectionDeviation * power.now();
         writeCdmaState(log, CdmaState::traffic, carrier, pilots,

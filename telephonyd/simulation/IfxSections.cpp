@@ -110,7 +110,7 @@ std::shared_ptr<Dictionary> ifxDedicatedChannel(const IfxConnection& connection)
          {"Hopping", makeDictionary({{"HSN", number(cell.hoppingSequence)}, {"Frequencies", frequencies}})},
          {"RxQual", number(connection.quality)},
          {"Timing Advance", number(timingAdvance(connection))},
-         {"Tx Power", makeDictionary({{"Level", number(powerLevel(connection.level))}})}});
+         {"Tx Power Level", makeDictionary({{"Ordered", number(powerLevel(connection.level))}})}});
 }
 
 std::shared_ptr<Dictionary> ifxPacketTransfer(const IfxConnection& connection)

@@ -156,6 +156,37 @@ class DecodeTest(Scratch):
             again = ctl("decode", *LTE, self.path(name))
             self.assertEqual((again.returncode, again.stderr, again.stdout), (0, "", run.stdout), name)
 
+    def test_shows_ifx_lists_and_drops_what_is_none(self):
+        first = plistlib.dumps({"Cell": {"Channel": {"ARFCN": "62"}, "BSIC": "2-2"}, "Neighbors": ["ARFCN", "70"]})
+        second = plistlib.dumps({"Cell": {"Channel": {"ARFCN": "78"}}}, fmt=plistlib.FMT_BINARY)
+        content = pcap([at(0, first), at(10, b"<plist>" + b"<array>" * 9_000), at(12, plistlib.dumps({"Cell": 78})),
+                        at(14, b""), at(20, second)])
+        run = self.decode(content, "--json", "--every", "2", "--system-log", self.path("log"), "--save",
+                          self.path("saved"), technology="IFX")
+        self.assertEqual((run.returncode, run.stderr), (0, ""))
+        before = {"/Cell/Channel": "62", "/Cell/BSIC": "2-2", "/Neighbors/0": "70"}
+        self.assertEqual([rows for _, rows in trees(run.stdout)], [before] * 4 + [{"/Cell": "78"}])
+        errors = [line for line in self.read("log").decode().splitlines() if line.startswith("<3>")]
+        self.assertEqual(errors, ["<3>Could not deserialize the object",
+                                  "<3>Unknown object of type Integer encountered",
+                                  "<3>Could not deserialize the object"])
+        saved = plistlib.loads(self.read("saved"))["Data"]
+        self.assertEqual(len(saved), 5)  # and no DLF file
+        self.assertEqual(saved[-1]["DisplayState"], {"Cell": {"Channel": {"ARFCN": "78"}}})
+        self.assertEqual(saved[-1]["Display"], {"Cell": "78"})
+
+    def test_shows_the_samples(self):
+        samples = os.path.join(os.path.dirname(os.path.abspath(__file__)), "../../resources/samples")
+        for name, technology in (("cdma", "Osprey CDMA"), ("gsm", "Osprey GSM"), ("ifx", "IFX"), ("lte", "Osprey LTE"),
+                                 ("utran", "Osprey UTRAN2")):
+            errors = []
+            for recording in (self.write("empty", pcap([])), os.path.join(samples, name + ".pcap")):
+                run = ctl("decode", "--technology", technology, "--system-log", self.path("log"), recording)
+                self.assertEqual((run.returncode, run.stderr), (0, ""))
+                errors.append(self.read("log").count(b"<3>"))
+            self.assertGreater(run.stdout.count("\n"), 30, name)
+            self.assertEqual(errors[1], errors[0], name)  # none but those of a generator that begins
+
     def test_ends_by_the_exception_of_an_unreadable_sim_payload(self):
         run = self.decode(pcap([at(0, lte_cell(5)), at(10, lte_cell(6)), at(20, internal(0, b"no list"))]),
                           "--json", "--every", "2", "--system-log", self.path("log"))

@@ -39,8 +39,8 @@ class Client:
         assert (kind, sequence) == (REPLY, 9)
         return plistlib.loads(payload)["GetTechnology"]
 
-    def start(self):
-        self.commands.sendall(frame(plistlib.dumps(START_COMMAND)))
+    def start(self, command=START_COMMAND):
+        self.commands.sendall(frame(plistlib.dumps(command)))
 
     def messages(self, count):
         received = []
@@ -125,16 +125,41 @@ class ServerTest(Scratch):
         self.assertEqual(stories[0], stories[1])
         self.assertNotEqual(stories[0], stories[2])
 
+    def test_simulates_every_technology(self):
+        for technology in ("IFX", "Osprey GSM", "Osprey CDMA", "Osprey LTE", "Osprey UTRAN2"):
+            command = plistlib.loads(ctl("start-command", "--technology", technology).stdout.encode())
+            codes = {*command.get("SetOspreyLogCodes", []), *(0xFF0000 + c for c in command.get("SetCtExtraCodes", []))}
+            server = self.serve("--simulate", technology, "--rate", "1000", "--record", self.path("record"))
+            client = self.client()
+            self.assertEqual(client.technology(), technology)
+            client.start(command)
+            received = client.messages(200)
+            client.close()
+            self.end(server)
+            self.assertEqual(recorded(self.read("record"))[:200], received)
+            decoded = ctl("decode", "--technology", technology, self.path("record"))
+            self.assertEqual((decoded.returncode, decoded.stderr), (0, ""))
+            self.assertGreater(decoded.stdout.count("\n"), 20)
+            for data in received:
+                if technology == "IFX":
+                    self.assertIsInstance(plistlib.loads(data), dict)
+                    continue
+                log_type, length, code = struct.unpack_from("<BHH", data)
+                self.assertIn(code + (0xFF0000 if log_type == 0xFF else 0), codes)
+                self.assertEqual(length, len(data) - 1)
+
     def test_serves_the_monitor(self):
-        server = self.serve("--simulate", "Osprey LTE", "--rate", "500", "--record", self.path("record"))
-        run = subprocess.run([PELORUSCTL, "live", "--count", "1"], env=self.environment, capture_output=True,
-                             text=True, timeout=20, check=False)
-        self.assertEqual((run.returncode, run.stderr), (0, ""))
-        self.assertRegex(run.stdout, r"\n +Physical Cell ID: \d+\n")
-        self.end(server)
-        decoded = ctl("decode", "--technology", "Osprey LTE", self.path("record"))
-        self.assertEqual(decoded.returncode, 0)
-        self.assertRegex(decoded.stdout, r"\n +Physical Cell ID: \d+\n")
+        for technology, row in (("Osprey LTE", r"Physical Cell ID: \d+"), ("Osprey CDMA", r"UATI24: 0x[0-9a-f]{6}"),
+                                ("IFX", r"Channel: \d+")):
+            server = self.serve("--simulate", technology, "--rate", "500", "--record", self.path("record"))
+            run = subprocess.run([PELORUSCTL, "live", "--count", "1"], env=self.environment, capture_output=True,
+                                 text=True, timeout=20, check=False)
+            self.assertEqual((run.returncode, run.stderr), (0, ""))
+            self.assertRegex(run.stdout, r"\n +%s\n" % row)
+            self.end(server)
+            decoded = ctl("decode", "--technology", technology, self.path("record"))
+            self.assertEqual(decoded.returncode, 0)
+            self.assertRegex(decoded.stdout, r"\n +%s\n" % row)
 
     def test_a_second_one_gives_way(self):
         server = self.serve("--simulate", "Osprey LTE")

@@ -87,7 +87,7 @@ protected:
 
     void seeChannel(const Dictionary& channel)
     {
-        const double power = numberIn(channel.at("Tx Power"));
+        const double power = numberIn(channel.at("Tx Power Level"));
         expect(power >= 5 && power <= 19, "power level");
         expect(numberIn(channel.at("RxQual")) <= 7, "RXQUAL");
         expect(numberIn(channel.at("Timing Advance")) <= 3, "timing advance in a town");
