@@ -179,13 +179,13 @@ class DecodeTest(Scratch):
         samples = os.path.join(os.path.dirname(os.path.abspath(__file__)), "../../resources/samples")
         for name, technology in (("cdma", "Osprey CDMA"), ("gsm", "Osprey GSM"), ("ifx", "IFX"), ("lte", "Osprey LTE"),
                                  ("utran", "Osprey UTRAN2")):
-            errors = []
-            for recording in (self.write("empty", pcap([])), os.path.join(samples, name + ".pcap")):
-                run = ctl("decode", "--technology", technology, "--system-log", self.path("log"), recording)
-                self.assertEqual((run.returncode, run.stderr), (0, ""))
-                errors.append(self.read("log").count(b"<3>"))
+            run = ctl("decode", "--technology", technology, "--system-log", self.path("log"),
+                      os.path.join(samples, name + ".pcap"))
+            self.assertEqual((run.returncode, run.stderr), (0, ""))
             self.assertGreater(run.stdout.count("\n"), 30, name)
-            self.assertEqual(errors[1], errors[0], name)  # none but those of a generator that begins
+            complaints = re.findall("<3>.*(?:ould not|ailed|Cannot|Log code|Invalid|Unknown).*",
+                                    self.read("log").decode())
+            self.assertEqual(complaints, [], name)
 
     def test_ends_by_the_exception_of_an_unreadable_sim_payload(self):
         run = self.decode(pcap([at(0, lte_cell(5)), at(10, lte_cell(6)), at(20, internal(0, b"no list"))]),
