@@ -1,7 +1,7 @@
 #include "LogGenerator/C2K/C2KLogGenerator.h"
 
 #include "LogGenerator/C2K/Decoders.h"
-#include "LogGenerator/Osprey/LogPacket.h"
+#include "LogGenerator/Osprey/Framing.h"
 #include "platform/PropertyList.h"
 #include "platform/SystemLog.h"
 
@@ -11,12 +11,6 @@ namespace pelorus {
 
 namespace {
 
-constexpr std::int64_t kPrefixMark = 0x81;
-constexpr std::size_t kPrefixLength = 2;
-constexpr std::int64_t kBasebandPacket = 1;
-constexpr std::int64_t kInternalPacket = 0xFF;
-constexpr Field kLogType = u8(0);
-constexpr Field kLogCode = u16(3);
 constexpr std::string_view kSortedMark = "_sorted";
 
 struct Decoder {
@@ -62,14 +56,12 @@ void C2KLogGenerator::updateFromLog(std::span<const std::byte> packet,
 {
     if (packet.size() < kPacketHeaderLength) // tested before the prefix goes, so 11 bytes may be left: meant
         return;
-    if (PacketView(packet)[kLogType] == kPrefixMark)
-        packet = packet.subspan(kPrefixLength);
+    packet = withoutPrefix(packet);
     const PacketView data(packet);
-    const std::int64_t type = data[kLogType];
+    const std::int64_t type = logTypeOf(data);
     if (type != kBasebandPacket) // and yet it is decoded: meant
         systemLog(kLogError, "Invalid log type: %x. Dropping.", static_cast<unsigned>(type));
-    const LogCode code =
-        static_cast<LogCode>(data[kLogCode]) | (type == kInternalPacket ? kInternalCodes : 0);
+    const LogCode code = logCodeOf(data);
     const auto* const decoder = std::find_if(std::begin(kDecoders), std::end(kDecoders),
                                              [code](const Decoder& known) { return known.code == code; });
     if (decoder == std::end(kDecoders))

@@ -1,6 +1,6 @@
 #include "LogGenerator/Osprey/OSPLogGenerator2.h"
 
-#include "LogGenerator/Osprey/LogPacket.h"
+#include "LogGenerator/Osprey/Framing.h"
 #include "platform/PropertyList.h"
 #include "platform/SystemLog.h"
 
@@ -8,17 +8,6 @@
 #include <stdexcept>
 
 namespace pelorus {
-
-namespace {
-
-constexpr std::int64_t kPrefixMark = 0x81;
-constexpr std::size_t kPrefixLength = 2;
-constexpr std::int64_t kBasebandPacket = 1;
-constexpr std::int64_t kInternalPacket = 0xFF;
-constexpr Field kLogType = u8(0);
-constexpr Field kLogCode = u16(3);
-
-} // namespace
 
 void OSPLogGenerator2::initWithPListName(std::string templateName, std::shared_ptr<ClassIndex> index)
 {
@@ -53,16 +42,13 @@ void OSPLogGenerator2::updateWithData(std::span<const std::byte> data)
 {
     if (data.size() < kPacketHeaderLength) // tested before the prefix goes, so 11 bytes may be left: meant
         return;
-    if (PacketView(data)[kLogType] == kPrefixMark)
-        data = data.subspan(kPrefixLength);
-    const LogPacket packet(data);
-    const std::int64_t type = packet[kLogType];
+    const LogPacket packet(withoutPrefix(data));
+    const std::int64_t type = logTypeOf(packet);
     if (type != kBasebandPacket && type != kInternalPacket) {
         systemLog(kLogError, "Invalid log type: %x. Dropping.", static_cast<unsigned>(type));
         return;
     }
-    const LogCode code =
-        static_cast<LogCode>(packet[kLogCode]) | (type == kInternalPacket ? kInternalCodes : 0);
+    const LogCode code = logCodeOf(packet);
     if (!cIndex)
         return;
     if (const auto* subscribers = cIndex->getSubscribers(code))
