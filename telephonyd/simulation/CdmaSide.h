@@ -1,7 +1,6 @@
 #pragma once
 
 #include "telephonyd/simulation/CdmaPackets.h"
-#include "telephonyd/simulation/TimeToTrigger.h"
 
 #include <span>
 

@@ -11,7 +11,7 @@ namespace pelorus {
 
 namespace {
 
-/// What the handset asks for at a C/I (DRC index 1 to 14). The counters of an index stand side by side: its
+/// What the handset asks for at a C/I (DRC), by rising rate. The counters of each stand side by side: its
 /// packet sizes from small to large, then what was lost.
 struct ForwardRate {
     double neededRatio; // dB, where one packet in a hundred is lost

@@ -51,7 +51,7 @@ std::shared_ptr<Dictionary> ifxServingCell(const GsmRadio& radio, std::size_t se
 {
     const GsmCell& cell = kGsmCells[serving];
     const double level = radio.average(serving);
-    const int pathLoss = rounded(level - kLowestAccess); // C1
+    const int criterion = rounded(level - kLowestAccess);
     return makeDictionary(
         {{"PLMN", makeDictionary({{"Network", "001 01"}})},
          {"Location",
@@ -62,7 +62,7 @@ std::shared_ptr<Dictionary> ifxServingCell(const GsmRadio& radio, std::size_t se
          {"BSIC", colourCode(cell)},
          {"RxLev", makeDictionary({{"Average", dBm(level)}, {"Last", dBm(radio.level(serving))}})},
          {"Selection",
-          makeDictionary({{"C1", number(pathLoss)}, {"C2", number(pathLoss + cell.reselectOffset)}})}});
+          makeDictionary({{"C1", number(criterion)}, {"C2", number(criterion + cell.reselectOffset)}})}});
 }
 
 std::shared_ptr<Array> ifxNeighbours(const GsmRadio& radio, std::size_t serving)
