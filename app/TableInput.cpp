@@ -4,7 +4,6 @@
 
 #include <QApplication>
 #include <QContextMenuEvent>
-#include <QGestureEvent>
 #include <QKeyEvent>
 #include <QScrollBar>
 #include <QScroller>
@@ -15,12 +14,13 @@ namespace pelorus {
 namespace {
 
 constexpr double kStripStep = 48; // of a key press
+constexpr int kHoldMilliseconds = 600;
 
 } // namespace
 
-void TableView::grabTouch()
+void TableView::acceptTouch()
 {
-    QScroller::grabGesture(viewport(), QScroller::TouchGesture);
+    viewport()->setAttribute(Qt::WA_AcceptTouchEvents);
     QScroller* scroller = QScroller::scroller(viewport());
     QScrollerProperties properties = scroller->scrollerProperties();
     properties.setScrollMetric(QScrollerProperties::AxisLockThreshold,
@@ -30,7 +30,6 @@ void TableView::grabTouch()
     properties.setScrollMetric(QScrollerProperties::VerticalOvershootPolicy,
                                QScrollerProperties::OvershootAlwaysOff);
     scroller->setScrollerProperties(properties);
-    viewport()->grabGesture(Qt::TapAndHoldGesture);
 }
 
 bool TableView::viewportEvent(QEvent* event)
@@ -43,17 +42,75 @@ bool TableView::viewportEvent(QEvent* event)
         flick(static_cast<QScrollEvent&>(*event).contentPos());
         return true;
     case QEvent::TouchBegin:
-        touched = true;
-        break;
-    case QEvent::MouseButtonPress:
-        touched = static_cast<QMouseEvent*>(event)->source() != Qt::MouseEventNotSynthesized;
-        break;
-    case QEvent::Gesture:
-        return hold(static_cast<QGestureEvent&>(*event));
+    case QEvent::TouchUpdate:
+    case QEvent::TouchEnd:
+    case QEvent::TouchCancel:
+        touch(static_cast<QTouchEvent&>(*event));
+        return true;
     default:
-        break;
+        return QAbstractScrollArea::viewportEvent(event);
     }
-    return QAbstractScrollArea::viewportEvent(event);
+}
+
+/// A finger taps, flicks, or is held still for the menu, which opens when it is lifted: an open one would
+/// take that for its own end.
+void TableView::touch(QTouchEvent& event)
+{
+    event.accept();
+    QScroller* scroller = QScroller::scroller(viewport());
+    if (event.type() == QEvent::TouchCancel) {
+        forgetPress();
+        scroller->stop();
+        return;
+    }
+    const QPointF where = event.points().front().position();
+    const auto row = rowAt(where.toPoint());
+    const auto time = static_cast<qint64>(event.timestamp());
+    switch (event.type()) {
+    case QEvent::TouchBegin:
+        if (row && scroller->state() == QScroller::Inactive) { // else it only stops what moves
+            press = Press{source.identityOfRow(*row), where.toPoint()};
+            holdTimer.start(kHoldMilliseconds, this);
+        }
+        scroller->handleInput(QScroller::InputPress, where, time);
+        break;
+    case QEvent::TouchUpdate:
+        scroller->handleInput(QScroller::InputMove, where, time);
+        if (scroller->state() == QScroller::Dragging)
+            forgetPress();
+        break;
+    default: {
+        scroller->handleInput(QScroller::InputRelease, where, time);
+        const auto released = press;
+        forgetPress();
+        if (!released || !row || source.identityOfRow(*row) != released->identity)
+            break;
+        if (released->held)
+            openMenu(*row, viewport()->mapToGlobal(released->where));
+        else
+            activateRow(*row);
+    }
+    }
+}
+
+void TableView::forgetPress()
+{
+    press.reset();
+    holdTimer.stop();
+}
+
+void TableView::timerEvent(QTimerEvent* event)
+{
+    if (event->timerId() != holdTimer.timerId()) {
+        QAbstractScrollArea::timerEvent(event);
+        return;
+    }
+    holdTimer.stop();
+    const auto row = press ? source.rowWithIdentity(press->identity) : std::nullopt;
+    if (!row)
+        return;
+    press->held = true;
+    setCurrentRow(*row); // the finger may be lifted
 }
 
 void TableView::prepareFlick(QScrollPrepareEvent& event)
@@ -74,21 +131,9 @@ void TableView::prepareFlick(QScrollPrepareEvent& event)
 
 void TableView::flick(const QPointF& position)
 {
-    press.reset(); // no tap comes of this
     verticalScrollBar()->setValue(static_cast<int>(std::lround(position.y())));
     if (const auto row = source.rowWithIdentity(flicked))
         setOffsetOfRow(*row, position.x());
-}
-
-bool TableView::hold(QGestureEvent& event)
-{
-    const auto* gesture = static_cast<QTapAndHoldGesture*>(event.gesture(Qt::TapAndHoldGesture));
-    if (!gesture || gesture->state() != Qt::GestureFinished || !touched)
-        return false; // with a mouse there is the other button
-    press.reset();
-    if (const auto row = rowAt(viewport()->mapFromGlobal(gesture->hotSpot().toPoint())))
-        openMenu(*row, gesture->hotSpot().toPoint());
-    return true;
 }
 
 void TableView::mousePressEvent(QMouseEvent* event)
@@ -104,7 +149,7 @@ void TableView::mousePressEvent(QMouseEvent* event)
 void TableView::mouseMoveEvent(QMouseEvent* event)
 {
     const auto row = press ? source.rowWithIdentity(press->identity) : std::nullopt;
-    if (!row || touched)
+    if (!row)
         return;
     const QPoint way = event->pos() - press->where;
     if (way.manhattanLength() >= QApplication::startDragDistance())

@@ -25,12 +25,7 @@ TableView::TableView(TableSource& shownSource, QWidget* parent)
     viewport()->setBackgroundRole(QPalette::Base);
     viewport()->setAutoFillBackground(true);
     verticalScrollBar()->setSingleStep(kRowHeight / 2);
-    grabTouch();
-}
-
-TableView::~TableView()
-{
-    QScroller::ungrabGesture(viewport());
+    acceptTouch();
 }
 
 void TableView::reloadData()
@@ -52,7 +47,7 @@ void TableView::reloadData()
     if (anchor != before.end())
         verticalScrollBar()->setValue(topBefore + (*find(anchor->identity) - anchor->row) * kRowHeight);
     layOutCells();
-    if (top() != topBefore && QScroller::hasScroller(viewport()))
+    if (top() != topBefore)
         QScroller::scroller(viewport())->resendPrepareEvent();
     tellAccessibilityOfReload(*this);
 }

@@ -3,13 +3,14 @@
 #include "app/PelorusCell.h"
 
 #include <QAbstractScrollArea>
+#include <QBasicTimer>
 #include <string>
 #include <unordered_map>
 #include <vector>
 
-class QGestureEvent;
 class QScrollEvent;
 class QScrollPrepareEvent;
+class QTouchEvent;
 
 namespace pelorus {
 
@@ -38,7 +39,6 @@ public:
 class TableView : public QAbstractScrollArea {
 public:
     explicit TableView(TableSource& source, QWidget* parent = nullptr);
-    ~TableView() override;
 
     void reloadData();
     /// A cell that no row needs any more, the one that the row in work had before if it can be.
@@ -71,6 +71,7 @@ protected:
     void contextMenuEvent(QContextMenuEvent* event) override;
     void wheelEvent(QWheelEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
+    void timerEvent(QTimerEvent* event) override;
 
 private:
     struct Shown {
@@ -86,10 +87,11 @@ private:
     void setOffsetOfRow(int row, double offset);
     double offsetOfRow(int row) const;
 
-    void grabTouch();
+    void acceptTouch();
+    void touch(QTouchEvent& event);
+    void forgetPress();
     void prepareFlick(QScrollPrepareEvent& event);
     void flick(const QPointF& position);
-    bool hold(QGestureEvent& event);
     void moveCurrent(int row);
 
     TableSource& source;
@@ -107,10 +109,11 @@ private:
         QPoint where;
         double offset = 0;
         bool drags = false;
+        bool held = false;
     };
     std::optional<Press> press;
-    std::string flicked;  // identity of the row that a finger was put on
-    bool touched = false; // by a finger, the last time
+    QBasicTimer holdTimer; // runs while a finger is held still
+    std::string flicked;   // identity of the row that a finger was put on
 };
 
 } // namespace pelorus

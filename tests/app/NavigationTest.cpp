@@ -74,13 +74,13 @@ TEST_F(Navigation, PanesSlideWhereTheDesktopWantsMotion)
     PelorusPaneController& pane = top();
     EXPECT_GT(pane.x(), 180);
     EXPECT_TRUE(root.isVisible());
-    QTRY_VERIFY_WITH_TIMEOUT(!root.isVisible(), 2000);
+    ASSERT_TRUE(QTest::qWaitFor([&] { return !root.isVisible(); }, 2000));
     EXPECT_EQ(pane.x(), 0);
     const QPointer<PelorusPaneController> leaving = &pane;
     press(Qt::Key_Backspace);
     EXPECT_EQ(&top(), &root);
     EXPECT_TRUE(root.isVisible());
-    QTRY_VERIFY_WITH_TIMEOUT(!leaving, 2000);
+    ASSERT_TRUE(QTest::qWaitFor([&] { return !leaving; }, 2000));
     EXPECT_EQ(root.x(), 0);
     EXPECT_TRUE(root.isVisible());
 }

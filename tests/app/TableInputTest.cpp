@@ -128,10 +128,25 @@ TEST_F(TableInput, AFingerScrollsThePaneOrAStripButNotBoth)
 
 TEST_F(TableInput, AFingerTapsARow)
 {
-    QTest::touchEvent(app.getWindow(), screen.get()).press(0, centre(0), table().viewport());
-    QTest::touchEvent(app.getWindow(), screen.get()).release(0, centre(0), table().viewport());
-    QTest::qWait(1);
+    QWidget* viewport = table().viewport();
+    const QPoint where = centre(0);
+    QTest::touchEvent(viewport, screen.get()).press(0, where, viewport);
+    QTest::touchEvent(viewport, screen.get()).release(0, where, viewport);
     EXPECT_EQ(top().path(), "/Cell");
+    EXPECT_EQ(depth(), 2u) << "once";
+}
+
+TEST_F(TableInput, AFingerThatIsHeldStillOpensTheMenu)
+{
+    QTest::touchEvent(table().viewport(), screen.get()).press(0, centre(2), table().viewport());
+    ASSERT_TRUE(QTest::qWaitFor([this] { return table().hasHighlight(); }, 3000));
+    EXPECT_EQ(table().currentRow(), 2);
+    QTest::touchEvent(table().viewport(), screen.get()).release(0, centre(2), table().viewport());
+    const QPointer<QMenu> menu = top().findChild<QMenu*>();
+    ASSERT_TRUE(menu && menu->isVisible());
+    QTest::qWait(50);
+    ASSERT_TRUE(menu && menu->isVisible());
+    menu->close();
 }
 
 TEST_F(TableInput, CopiesTheChosenRowsValueOrTheWholePane)
