@@ -1,8 +1,9 @@
 #include "app/HomeScreenPreferences.h"
 
+#include "app/SessionBus.h"
+
 #include <QDBusConnection>
 #include <QDBusMessage>
-#include <QFile>
 #include <QSettings>
 
 namespace pelorus {
@@ -10,14 +11,6 @@ namespace pelorus {
 namespace {
 
 const QString kDomain = QStringLiteral("io.pelorus.HomeScreen");
-
-/// Asking for a bus where there is none could start one.
-bool isThereASessionBus()
-{
-    return qEnvironmentVariableIsSet("DBUS_SESSION_BUS_ADDRESS") ||
-           (qEnvironmentVariableIsSet("XDG_RUNTIME_DIR") &&
-            QFile::exists(qEnvironmentVariable("XDG_RUNTIME_DIR") + QStringLiteral("/bus")));
-}
 
 void notifyOf(const char* key)
 {

@@ -1,4 +1,5 @@
 #include "app/Application.h"
+#include "app/ColourScheme.h"
 #include "app/Display.h"
 #include "app/PelorusApp.h"
 #include "platform/Console.h"
@@ -30,6 +31,7 @@ void blockSignals()
 
 int runApplication()
 {
+    const ColourScheme colours;
     LinuxPlatform platform;
     LinuxHomeScreenPreferences homeScreen;
     PelorusApp app(platform, homeScreen, ResourceDirectory::besideThisProgram().path());

@@ -4,12 +4,13 @@ in through the screen, and what is shown comes out through accessibility."""
 import os
 import signal
 import subprocess
+import threading
 import time
 
 import gi
 
 gi.require_version("Atspi", "2.0")
-from gi.repository import Atspi, GLib  # noqa: E402
+from gi.repository import Atspi, Gio, GLib  # noqa: E402
 
 PATIENCE = 20  # seconds
 
@@ -43,10 +44,37 @@ class Desktop:
         os.environ["DBUS_SESSION_BUS_ADDRESS"] = self.bus.stdout.readline().strip()
         os.environ["QT_LINUX_ACCESSIBILITY_ALWAYS_ON"] = "1"
 
+    def prefer_dark(self):
+        """Plays the portal that tells what the user wants."""
+        bus = Gio.DBusConnection.new_for_address_sync(
+            os.environ["DBUS_SESSION_BUS_ADDRESS"],
+            Gio.DBusConnectionFlags.AUTHENTICATION_CLIENT | Gio.DBusConnectionFlags.MESSAGE_BUS_CONNECTION)
+        node = Gio.DBusNodeInfo.new_for_xml(
+            "<node><interface name='org.freedesktop.portal.Settings'><method name='Read'><arg type='s' direction='in'/>"
+            "<arg type='s' direction='in'/><arg type='v' direction='out'/></method></interface></node>")
+
+        def answer(_bus, _sender, _path, _interface, _method, parameters, invocation):
+            assert parameters.unpack() == ("org.freedesktop.appearance", "color-scheme")
+            invocation.return_value(GLib.Variant("(v)", [GLib.Variant("v", GLib.Variant("u", 1))]))
+
+        bus.register_object("/org/freedesktop/portal/desktop", node.interfaces[0], answer, None, None)
+        bus.call_sync("org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus", "RequestName",
+                      GLib.Variant("(su)", ["org.freedesktop.portal.Desktop", 4]), None,
+                      Gio.DBusCallFlags.NONE, -1, None)
+        threading.Thread(target=GLib.MainLoop().run, daemon=True).start()
+        return bus
+
     def close(self):
         for process in (self.bus, self.screen):
             process.terminate()
             process.wait()
+
+
+def colour(picture, x, y):
+    """The colour of a picture's pixel as (red, green, blue), each 0 to 255."""
+    out = subprocess.run(["convert", picture, "-crop", f"1x1+{x}+{y}", "-depth", "8", "rgb:-"], capture_output=True,
+                         timeout=PATIENCE, check=True).stdout
+    return tuple(out)
 
 
 def tool(*arguments):

@@ -20,7 +20,7 @@ PELORUS, PICTURES = sys.argv[3:5]
 del sys.argv[3:5]
 sys.path.insert(0, os.path.join(os.path.dirname(os.path.abspath(__file__)), "..", "pelorusctl"))
 
-from desktop import Desktop, Monitor, tool, wait_for  # noqa: E402
+from desktop import Desktop, Monitor, colour, wait_for  # noqa: E402
 from programs import TELEPHONYD, Scratch, ctl, main  # noqa: E402
 from recordings import internal, lte_cell  # noqa: E402
 from telephony import TelephonyServer  # noqa: E402
@@ -124,6 +124,17 @@ class WithHandset(Window):
         self.assertRegex(report["timestamp"], r"^20\d\d-\d\d-\d\d \d\d:\d\d:\d\d \+0000$")
         self.assertRegex(report["entries"][-1]["description"], r"^DLF binary \(\d+ bytes\)$")
         wait_for("the status", lambda: monitor.shows("Updated 20"))
+
+
+    def test_is_dark_where_the_desktop_is(self):
+        self.serve("--simulate", "Osprey GSM", "--rate", "50")
+        portal = DESKTOP.prefer_dark()
+        self.addCleanup(portal.close_sync, None)
+        monitor = self.open(size=(360, 640))
+        wait_for("the first update", lambda: monitor.shows("Updated 20"))
+        monitor.open_row(1, monitor.rows()[1][0])
+        self.picture("dark")
+        self.assertEqual(max(colour(os.path.join(PICTURES, "dark.png"), 3, 560)), 0x1f)
 
 
 class WithServerOfOurOwn(Window):
