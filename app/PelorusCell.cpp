@@ -137,7 +137,9 @@ void PelorusCell::paintEvent(QPaintEvent*)
     const QColor text = colours.color(highlighted ? QPalette::HighlightedText : QPalette::Text);
     const QRectF content = contentFrame();
     painter.fillRect(rect(), background);
-    painter.fillRect(QRectF(content.x() + 10, height() - 1, width() - content.x() - 10, 1),
+    // From the name to the edge of the window, or as far beyond the content of a wide one.
+    const double end = std::min<double>(width(), content.right() + kRightMargin);
+    painter.fillRect(QRectF(content.x() + 10, height() - 1, end - content.x() - 10, 1),
                      blend(background, text, highlighted ? 0 : 0.13));
     painter.translate(content.topLeft());
     painter.setPen(text);

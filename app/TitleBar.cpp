@@ -15,6 +15,7 @@ namespace {
 constexpr int kHeight = 48;
 constexpr int kSpace = 6;
 constexpr int kArrowSize = 16;
+constexpr int kShortestName = 64;
 
 } // namespace
 
@@ -64,16 +65,18 @@ void TitleBar::resizeEvent(QResizeEvent*)
     arrange();
 }
 
-/// The title is in the middle as long as there is room; the way back yields first.
+/// The title is in the middle. The way back yields first: it is only an arrow where its name would be cut
+/// down to nothing.
 void TitleBar::arrange()
 {
-    const int titleWidth = std::min(label->sizeHint().width(), width() / 2);
-    const int room = (width() - titleWidth) / 2 - 2 * kSpace;
     const int ofArrow = kArrowSize + 20;
-    button->setText(button->fontMetrics().elidedText(backTitle, Qt::ElideRight, std::max(0, room - ofArrow)));
-    const bool text = room > ofArrow + 40;
-    button->setToolButtonStyle(text ? Qt::ToolButtonTextBesideIcon : Qt::ToolButtonIconOnly);
-    button->resize(std::min(button->sizeHint().width(), std::max(room, ofArrow)), button->height());
+    const int titleWidth = std::min(label->sizeHint().width(), width() - 2 * (ofArrow + 2 * kSpace));
+    const int room = (width() - titleWidth) / 2 - 2 * kSpace;
+    const int needed = button->fontMetrics().horizontalAdvance(backTitle);
+    const bool named = room - ofArrow >= std::min(needed, kShortestName);
+    button->setText(button->fontMetrics().elidedText(backTitle, Qt::ElideRight, room - ofArrow));
+    button->setToolButtonStyle(named ? Qt::ToolButtonTextBesideIcon : Qt::ToolButtonIconOnly);
+    button->resize(named ? std::min(button->sizeHint().width(), room) : ofArrow, button->height());
     button->move(kSpace, kSpace);
     const int side = button->isHidden() ? 2 * kSpace : button->geometry().right() + 1 + kSpace;
     label->setGeometry(side, 0, width() - 2 * side, height());

@@ -39,6 +39,21 @@ TEST_F(Navigation, TheTitleBarNamesThePaneAndTheWayBack)
     EXPECT_FALSE(titleBar().backButton().isVisible());
 }
 
+TEST_F(Navigation, TheWayBackIsAnArrowWhereThereIsNoRoomForItsName)
+{
+    const auto inner = makeDictionary({{"A name that is long", cell("7", "3")}, {"B", "1"}});
+    receive(makeDictionary({{"Another name that is long", inner}, {"B", "1"}}));
+    click(0);
+    click(0);
+    ASSERT_EQ(titleBar().title(), "A name that is long");
+    app.getWindow()->resize(600, 640);
+    EXPECT_EQ(titleBar().backButton().toolButtonStyle(), Qt::ToolButtonTextBesideIcon);
+    app.getWindow()->resize(320, 480);
+    EXPECT_EQ(titleBar().backButton().toolButtonStyle(), Qt::ToolButtonIconOnly);
+    EXPECT_EQ(titleBar().backButton().accessibleName(), "Back to Another name that is long");
+    EXPECT_LT(titleBar().backButton().geometry().right(), 48);
+}
+
 TEST_F(Navigation, TheToolbarShowsIndicatorStatusAndSaveFromTheLeft)
 {
     EXPECT_FALSE(toolbar().indicator().isVisible());

@@ -109,7 +109,7 @@ class WithHandset(Window):
         monitor = self.open(size=(360, 640))
         wait_for("the first update", lambda: monitor.shows("Updated 20"))
         monitor.keys("ctrl+s")
-        wait_for("the save screen", lambda: monitor.shows("Save Snapshot"))
+        wait_for("the save screen", lambda: "Snapshot" in monitor.labels())
         wait_for("its list", lambda: len(list(monitor.each("list"))) == 1)
         monitor.type("In the lift")
         self.picture("save")
