@@ -37,7 +37,7 @@ PelorusCell::PelorusCell(QString reuseIdentifier, bool leaf, QWidget* parent)
 {
     if (leaf) {
         valueLabel.emplace(systemFont(kCellFontSize));
-        view.emplace();
+        view = ScrollView{};
     }
     setFocusPolicy(Qt::NoFocus);
     setAttribute(Qt::WA_TransparentForMouseEvents); // the table knows what to do with them
