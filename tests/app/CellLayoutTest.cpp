@@ -62,6 +62,12 @@ TEST(CellLayout, CountsFromWhereTheBoundsAre)
     EXPECT_EQ(scrolls.scrollView, (Rect{5, 7, 320, 50}));
 }
 
+TEST(CellLayout, TellsTheVeryWidthFromLessWhereTheBoundsDoNotBeginAtTheLeft)
+{
+    EXPECT_EQ(leafLayout({5, 0, 320, 50}, {100, 18}, {159, 18}).value.x, 161); // flush with the width
+    EXPECT_EQ(leafLayout({5, 0, 320, 50}, {100, 18}, {160, 18}).value.x, 165); // behind the gap
+}
+
 TEST(CellLayout, KeepsTheStripFiftyHighInAHigherRow)
 {
     const LeafLayout layout = leafLayout({0, 0, 320, 80}, {100, 18}, {60, 18});
