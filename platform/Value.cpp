@@ -88,13 +88,12 @@ Value& Dictionary::slotElsewhere(Label key, std::size_t& hint)
     return entries[hint].value;
 }
 
-Value& Dictionary::rewriteOther(std::size_t place, Label key)
+void Dictionary::rewriteKey(std::size_t place, Label key)
 {
     if (place == entries.size())
         entries.push_back({key.key(), {}});
     else
         entries[place].key = key.key();
-    return entries[place].value;
 }
 
 void Dictionary::remove(std::string_view key)

@@ -28,11 +28,9 @@ public:
         return a.view.size() == b.size() && (a.view.data() == b.data() || a.view == b);
     }
 
-    /// Whether it is that very literal, which an equal text from elsewhere is not.
-    constexpr bool is(std::string_view literal) const
-    {
-        return view.data() == literal.data() && view.size() == literal.size();
-    }
+    /// Whether it is that very literal, which an equal text from elsewhere is not. Two literals that begin at
+    /// one address are one.
+    constexpr bool is(std::string_view literal) const { return view.data() == literal.data(); }
 
 private:
     struct Literal {};
@@ -96,11 +94,11 @@ public:
     Dictionary* dictionary() const { return pointee(std::get_if<std::shared_ptr<Dictionary>>(&held)); }
     std::shared_ptr<Array> sharedArray() const;
     std::shared_ptr<Dictionary> sharedDictionary() const;
-    /// The dictionary, which the value lets go of; null when it is of another kind.
-    std::shared_ptr<Dictionary> takeDictionary()
+    /// The dictionary when nobody else holds it; null otherwise.
+    Dictionary* unsharedDictionary() const
     {
-        auto* present = std::get_if<std::shared_ptr<Dictionary>>(&held);
-        return present ? std::move(*present) : nullptr;
+        const auto* present = std::get_if<std::shared_ptr<Dictionary>>(&held);
+        return present && present->use_count() == 1 ? present->get() : nullptr;
     }
 
     /// The string to write into; a value of another kind becomes an empty string first.
@@ -177,14 +175,13 @@ public:
     void remove(std::string_view key);
     void clear() { entries.clear(); }
     void reserve(std::size_t count) { entries.reserve(count); }
-    /// The value at a place, whose key becomes `key`; `place` is at most size(). For making a dictionary anew
-    /// in the memory of an old one: no other entry may have that key when truncate() has ended it.
-    Value& rewrite(std::size_t place, Label key)
-    {
-        if (place < entries.size() && entries[place].key.is(key.text)) [[likely]]
-            return entries[place].value;
-        return rewriteOther(place, key);
-    }
+    /// For making a dictionary anew in the memory of an old one: its entries, whose values may be changed;
+    /// valid until an entry is added or removed.
+    Entry* first() { return entries.data(); }
+    Entry* last() { return entries.data() + entries.size(); }
+    /// Gives the entry at a place, which is at most size(), another key. No other entry may have that key
+    /// when truncate() has ended the dictionary.
+    void rewriteKey(std::size_t place, Label key);
     void truncate(std::size_t count)
     {
         entries.erase(entries.begin() + static_cast<std::ptrdiff_t>(count), entries.end());
@@ -199,7 +196,6 @@ public:
 private:
     void setText(std::string_view key, Value value);
     Value& slotElsewhere(Label key, std::size_t& hint);
-    Value& rewriteOther(std::size_t place, Label key);
     std::vector<Entry> entries;
 };
 

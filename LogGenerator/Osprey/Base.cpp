@@ -69,6 +69,14 @@ void Base::clearElementsInArray(Array& array)
     ArrayLock::unlockArray();
 }
 
+void Base::clearElementsInArray(Array& array, std::vector<Value>& removed)
+{
+    removed.clear();
+    ArrayLock::lockArray();
+    array.elements.swap(removed);
+    ArrayLock::unlockArray();
+}
+
 void Base::replaceArray(Array& array, std::vector<Value>& elements)
 {
     ArrayLock::lockArray();

@@ -32,6 +32,8 @@ public:
     void updateLogCodeDict(CodeDictionary& codeDict);
 
     static void clearElementsInArray(Array& array);
+    /// As above; `removed` gets what the array held.
+    static void clearElementsInArray(Array& array, std::vector<Value>& removed);
     /// `elements` is left empty.
     static void replaceArray(Array& array, std::vector<Value>& elements);
 

@@ -4,21 +4,33 @@ namespace pelorus {
 
 void ListRewriter::clear(Array& list)
 {
-    // From the end, so that each record finds its own rows again, which often show the same.
-    for (auto element = list.elements.rbegin(); element != list.elements.rend(); ++element)
-        if (auto rows = element->takeDictionary(); rows && rows.use_count() == 1)
-            spare.push_back(std::move(rows));
-    elements.clear();
-    Base::clearElementsInArray(list);
+    Base::clearElementsInArray(list, elements);
+    spareFrom(0);
 }
 
-std::shared_ptr<Dictionary> ListRewriter::freshRows()
+Dictionary& ListRewriter::rowsAt(std::size_t place)
 {
-    if (spare.empty())
-        return makeDictionary();
-    auto rows = std::move(spare.back());
-    spare.pop_back();
-    return rows;
+    if (place == elements.size())
+        elements.emplace_back();
+    Value& element = elements[place];
+    if (Dictionary* const own = element.unsharedDictionary()) [[likely]]
+        return *own;
+    if (spare.empty()) {
+        element = makeDictionary();
+    } else {
+        element = std::move(spare.back());
+        spare.pop_back();
+    }
+    return *element.dictionary();
+}
+
+void ListRewriter::spareFrom(std::size_t place)
+{
+    // From the end, so that each record finds its own rows again, which often show the same.
+    for (std::size_t index = elements.size(); index > place; --index)
+        if (elements[index - 1].unsharedDictionary())
+            spare.push_back(std::move(elements[index - 1]));
+    elements.resize(place);
 }
 
 } // namespace pelorus

@@ -20,27 +20,25 @@ public:
     template <class Fill> void rewriteTexts(Array& list, std::size_t count, Fill fill);
 
 private:
-    std::shared_ptr<Dictionary> freshRows();
+    /// The dictionary at a place among the elements, or a spare or new one put there.
+    Dictionary& rowsAt(std::size_t place);
+    /// Takes the elements from a place on out of the list in the making.
+    void spareFrom(std::size_t place);
 
-    std::vector<std::shared_ptr<Dictionary>> spare;
+    std::vector<Value> spare;    // dictionaries that nobody else holds
     std::vector<Value> elements; // of the list in the making; empty in between, kept for its memory
 };
 
 template <class Fill> void ListRewriter::rewriteRows(Array& list, std::size_t count, Fill fill)
 {
-    clear(list);
-    if (count == 0)
-        return;
-    std::shared_ptr<Dictionary> dictionary;
+    Base::clearElementsInArray(list, elements);
+    std::size_t kept = 0;
     for (std::size_t index = 0; index < count; ++index) {
-        if (!dictionary)
-            dictionary = freshRows();
-        RowWriter rows(*dictionary);
+        RowWriter rows(rowsAt(kept));
         if (fill(index, rows))
-            elements.emplace_back(std::move(dictionary));
+            ++kept;
     }
-    if (dictionary)
-        spare.push_back(std::move(dictionary));
+    spareFrom(kept);
     Base::replaceArray(list, elements);
 }
 

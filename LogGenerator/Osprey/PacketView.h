@@ -29,9 +29,11 @@ public:
     /// The field's value. Throws std::out_of_range when it is not wholly inside, so ask covers() first.
     std::int64_t operator[](Field field) const
     {
+        if (std::size_t{field.byte} + sizeof(std::uint64_t) <= bytes.size()) [[likely]]
+            return extract(field, loadWord(bytes.data() + field.byte));
         if (!covers(field.end())) [[unlikely]]
             throw std::out_of_range("field beyond the packet");
-        return extract(field, load(field));
+        return extract(field, loadBytes(bytes.data() + field.byte, field.end() - field.byte));
     }
 
     /// The field's value where bytes beyond the end read as 0.
@@ -47,9 +49,10 @@ public:
     /// wholly inside.
     PacketView record(Records records, std::size_t index, std::size_t count) const
     {
-        if (index >= count || index >= wholeRecords(records, count)) [[unlikely]]
+        const std::size_t start = records.start + index * records.stride;
+        if (index >= count || !covers(start + records.length)) [[unlikely]]
             throw ArrayOutOfBoundsException();
-        return PacketView(bytes.subspan(records.start + index * records.stride, records.length));
+        return PacketView(bytes.subspan(start, records.length));
     }
 
     /// As record(), for records whose fields reach beyond them: `Length` bytes from the record's start, those
@@ -73,13 +76,9 @@ public:
     }
 
 private:
-    /// Eight bytes from the field's first on, as a little-endian number; fewer at the end, at least the
-    /// field's own.
-    std::uint64_t load(Field field) const
+    // No field reaches beyond the eight bytes from its first on.
+    static std::uint64_t loadWord(const std::byte* place)
     {
-        const std::byte* const place = bytes.data() + field.byte;
-        if (field.byte + sizeof(std::uint64_t) > bytes.size()) [[unlikely]]
-            return loadBytes(place, field.end() - field.byte);
         std::uint64_t word = 0;
         std::memcpy(&word, place, sizeof word);
         if constexpr (std::endian::native == std::endian::big)

@@ -35,20 +35,41 @@ void writeNumber(const Format& format, std::int64_t shown, Value& out)
 
 void showRows(Dictionary& entry, std::span<const Row> rows, PacketView data)
 {
-    std::size_t place = 0; // templates list the rows in the order of the tables
+    Dictionary::Entry* place = entry.first(); // templates list the rows in the order of the tables
+    Dictionary::Entry* last = entry.last();
     for (const Row& row : rows) {
-        writeRow(row, data, entry.slot(row.label, place));
+        if (place == last || !place->key.is(row.label.text)) [[unlikely]] {
+            auto found = static_cast<std::size_t>(place - entry.first());
+            entry.slot(row.label, found);
+            place = entry.first() + found;
+            last = entry.last();
+        }
+        writeRow(row, data, place->value);
         ++place;
     }
 }
 
 void RowWriter::show(std::span<const Row> table, PacketView data)
 {
-    for (const Row& row : table)
-        if (!writeRow(row, data, rows.rewrite(written, row.label)))
-            continue; // the place is used by the next row
-        else
-            ++written;
+    Dictionary::Entry* entry = place; // in a register, where writing a text cannot change it
+    for (const Row& row : table) {
+        if (entry == last || !entry->key.is(row.label.text)) [[unlikely]] {
+            place = entry;
+            placeElsewhere(row.label);
+            entry = place;
+        }
+        if (writeRow(row, data, entry->value)) // else the next row takes the place
+            ++entry;
+    }
+    place = entry;
+}
+
+void RowWriter::placeElsewhere(Label label)
+{
+    const std::size_t index = written();
+    rows.rewriteKey(index, label);
+    place = rows.first() + index;
+    last = rows.last();
 }
 
 } // namespace pelorus

@@ -106,18 +106,29 @@ void showRows(Dictionary& entry, std::span<const Row> rows, PacketView data);
 /// Makes a list's row dictionary anew in the memory of an old one: every row that is not written again goes.
 class RowWriter {
 public:
-    explicit RowWriter(Dictionary& dictionary) : rows(dictionary) {}
+    explicit RowWriter(Dictionary& dictionary) : rows(dictionary), place(rows.first()), last(rows.last()) {}
     RowWriter(const RowWriter&) = delete;
     RowWriter& operator=(const RowWriter&) = delete;
-    ~RowWriter() { rows.truncate(written); }
+    ~RowWriter() { rows.truncate(written()); }
 
     /// The value of the next row; rows appear in the order of these calls.
-    Value& next(Label label) { return rows.rewrite(written++, label); }
+    Value& next(Label label)
+    {
+        if (place == last || !place->key.is(label.text)) [[unlikely]]
+            placeElsewhere(label);
+        return (place++)->value;
+    }
     void show(std::span<const Row> table, PacketView data);
 
 private:
+    std::size_t written() const { return static_cast<std::size_t>(place - rows.first()); }
+    /// Gives the place another key, or makes it.
+    void placeElsewhere(Label label);
+
     Dictionary& rows;
-    std::size_t written = 0;
+    // Walking a table's rows costs little more than the comparison of two addresses a row.
+    Dictionary::Entry* place;
+    Dictionary::Entry* last;
 };
 
 } // namespace pelorus

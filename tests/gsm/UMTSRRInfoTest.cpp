@@ -3,6 +3,8 @@
 #include "tests/gsm/ShownText.h"
 #include "tests/support/SectionFixture.h"
 
+#include <algorithm>
+#include <cstdio>
 #include <gmock/gmock.h>
 
 namespace pelorus::test {
@@ -94,6 +96,19 @@ std::string shownPower(const PacketBuilder& packet)
     SectionFixture<UMTSRRInfo> section(makeDictionary());
     section.receive(0x4031, packet);
     return section.row("Transmit Power");
+}
+
+TEST(UMTSRRInfo, ShowsTheMeanAsPrintfShowsItInDoublePrecision)
+{
+    for (std::size_t count = 1; count <= 255; ++count)
+        for (std::size_t ones = 0; ones <= count; ones += 1 + count / 20) {
+            std::vector<int> values(count, 188); // 0 dBm
+            std::fill_n(values.begin(), ones, 198);
+            char text[32];
+            std::snprintf(text, sizeof text, "%4.2f dBm",
+                          static_cast<double>(ones) / static_cast<double>(count));
+            ASSERT_EQ(shownPower(samples(values)), text) << ones << " of " << count;
+        }
 }
 
 TEST(UMTSRRInfo, TakesTheMeanOfTheTransmitPower)

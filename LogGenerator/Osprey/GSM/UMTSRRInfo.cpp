@@ -7,7 +7,6 @@
 #include "LogGenerator/Osprey/MonitoredCells.h"
 
 #include <fmt/format.h>
-#include <iterator>
 
 namespace pelorus {
 
@@ -32,23 +31,33 @@ constexpr CellRow kMonitorRows[] = {
     {CellMonitor::kSCN, "Scrambling Code", "UMTSRRInfo: Failed to retrieve Scrambling Code\n"},
 };
 
+/// The text of sum / samples in double precision.
+void writeMean(std::int64_t sum, std::int64_t samples, std::string& shown)
+{
+    static constexpr Format kFormat = "%4.2f dBm";
+    const bool endsInHalf = samples > 0 && sum * 200 % samples == 0 && sum * 200 / samples % 2 != 0;
+    if (samples > 0 && !endsInHalf) {
+        kFormat.writeFixed(shown, sum * Format::kOne / samples);
+        return;
+    }
+    // Which way a half goes hangs on the double next to it. No sample is 0 / 0, shown as printf shows it:
+    // meant.
+    shown = fmt::format("{:4.2f} dBm", static_cast<double>(sum) / static_cast<double>(samples));
+}
+
 void showTransmitPower(TableSection& section, const LogPacket& data)
 {
     using Layout = LogCode_0x4031;
     const std::size_t count =
         data.wholeRecords(Layout::samples, static_cast<std::size_t>(data[Layout::sampleCount]));
-    double sum = 0;
-    int samples = 0;
+    std::int64_t sum = 0;
+    std::int64_t samples = 0;
     for (std::size_t index = 0; index < count; ++index)
         if (const std::int64_t power = data.record(Layout::samples, index, count)[Layout::Sample::power]) {
-            sum += static_cast<double>((power + 512) / 10 - 70);
+            sum += (power + 512) / 10 - 70;
             ++samples;
         }
-    Dictionary* const entry = section.entry();
-    std::string& shown = entry->slot("Transmit Power").text();
-    shown.clear();
-    // Without a sample this is 0 / 0, and shown as printf shows that: meant.
-    fmt::format_to(std::back_inserter(shown), "{:4.2f} dBm", sum / samples);
+    writeMean(sum, samples, section.entry()->slot("Transmit Power").text());
 }
 
 // Only the cell monitor tells the UARFCN; a new cell makes it stale.
