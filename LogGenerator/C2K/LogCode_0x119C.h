@@ -39,7 +39,7 @@ struct LogCode_0x119C : SubpacketLayout {
         }
         static constexpr Field pn = u16(0);
         /// With a k of 0 it stands in the record that follows: meant.
-        static constexpr Field energy(std::size_t k) { return u16(12 + 4 * k); }
+        static constexpr Field energy(std::uint32_t k) { return u16(12 + 4 * k); }
     };
     struct Fingers {
         static constexpr unsigned identifier = 4;

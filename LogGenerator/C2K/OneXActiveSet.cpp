@@ -39,7 +39,7 @@ std::shared_ptr<Dictionary> oneXActiveSet(PacketView activeSet, const Dictionary
 {
     const Scale scale{activeSet.padded(Layout::a), activeSet.padded(Layout::b), activeSet.padded(Layout::c)};
     const auto count = static_cast<std::size_t>(activeSet.padded(Layout::pilotCount));
-    const auto k = static_cast<std::size_t>(activeSet.padded(Layout::k));
+    const auto k = static_cast<std::uint32_t>(activeSet.padded(Layout::k));
     const std::int64_t reference = activeSet.padded(Layout::referencePn);
     const Records records = Layout::pilots(k);
     PilotList pilots(shown);

@@ -71,7 +71,7 @@ void putRadio(PacketWriter radio, bool isTalking, const CdmaCarrier& carrier, do
     radio.put(Radio::transmitLevel, rounded(10.0 * transmitLevel));
 }
 
-void putActiveSet(PacketWriter activeSet, std::size_t chains, const CdmaCarrier& carrier,
+void putActiveSet(PacketWriter activeSet, std::uint32_t chains, const CdmaCarrier& carrier,
                   const PilotSet& pilots)
 {
     using ActiveSet = LogCode_0x119C::ActiveSet;
@@ -97,7 +97,7 @@ void writeCdmaState(MessageBatch& log, CdmaState state, const CdmaCarrier& carri
 {
     using Layout = LogCode_0x119C;
     const bool isTalking = state == CdmaState::traffic;
-    const std::size_t chains = isTalking ? 2 : 1;
+    const std::uint32_t chains = isTalking ? 2 : 1;
     const Records records = Layout::ActiveSet::pilots(chains);
     const std::size_t activeSetSize = records.start + records.stride * pilots.size();
     Subpackets subpackets(

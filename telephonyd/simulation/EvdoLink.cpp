@@ -120,7 +120,7 @@ void EvdoLink::write(MessageBatch& log, std::uint32_t sequenceNumber) const
     PacketWriter sent = log.packet(0x127E, Reverse::minimumLength);
     sent.put(Reverse::sequenceNumber, sequenceNumber);
     for (std::size_t index = 0; index < kPayloads; ++index)
-        for (std::size_t subpacket = 0; subpacket < kSubpackets; ++subpacket)
+        for (std::uint32_t subpacket = 0; subpacket < kSubpackets; ++subpacket)
             sent.record(Reverse::counters, index).put(u32(4 * subpacket), reverse[index][subpacket]);
 }
 
