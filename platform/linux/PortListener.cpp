@@ -2,13 +2,14 @@
 
 #include "platform/linux/CallbackBoundary.h"
 
-#include <QLocalServer>
 #include <QLocalSocket>
+#include <QSocketNotifier>
 #include <QTimer>
 #include <atomic>
 #include <cerrno>
 #include <cstdio>
 #include <cstring>
+#include <fcntl.h>
 #include <fmt/format.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
@@ -19,6 +20,8 @@ namespace pelorus {
 namespace {
 
 constexpr int kBacklog = 128;
+constexpr int kAcceptedPerTurn = 32;
+constexpr std::chrono::milliseconds kPauseWithoutDescriptors{500};
 
 sockaddr_un addressOf(const std::string& path)
 {
@@ -52,6 +55,22 @@ FileDescriptor listenAt(const std::string& path)
         ::listen(socket.get(), kBacklog) == 0)
         return socket;
     return FileDescriptor();
+}
+
+/// Where a Unix-domain stream socket listens; nothing for a descriptor of another kind.
+std::optional<std::string> pathOfListener(int descriptor)
+{
+    int type = 0;
+    int listens = 0;
+    socklen_t length = sizeof(int);
+    sockaddr_un address = {};
+    socklen_t addressLength = sizeof address;
+    if (::getsockopt(descriptor, SOL_SOCKET, SO_TYPE, &type, &length) != 0 || type != SOCK_STREAM ||
+        ::getsockopt(descriptor, SOL_SOCKET, SO_ACCEPTCONN, &listens, &length) != 0 || listens == 0 ||
+        ::getsockname(descriptor, reinterpret_cast<sockaddr*>(&address), &addressLength) != 0 ||
+        address.sun_family != AF_UNIX)
+        return std::nullopt;
+    return std::string(address.sun_path, ::strnlen(address.sun_path, sizeof address.sun_path));
 }
 
 /// Unlike any other listener's, so that no clean-up can meet another's file.
@@ -97,9 +116,8 @@ PortListener::Outcome PortListener::listen(const PortDirectory& where, const std
     // Listens before it has its name, which then replaces a stale file: whoever finds it can connect.
     const std::string temporary = temporaryPath(where);
     ::unlink(temporary.c_str());
-    FileDescriptor socket = listenAt(temporary);
-    if (!socket || ::stat(temporary.c_str(), &status) != 0 ||
-        ::rename(temporary.c_str(), path->c_str()) != 0) {
+    FileDescriptor made = listenAt(temporary);
+    if (!made || ::stat(temporary.c_str(), &status) != 0 || ::rename(temporary.c_str(), path->c_str()) != 0) {
         why = fmt::format("{}: cannot listen: {}", *path, std::strerror(errno));
         ::unlink(temporary.c_str());
         return Outcome::failed;
@@ -108,50 +126,93 @@ PortListener::Outcome PortListener::listen(const PortDirectory& where, const std
     inode = status.st_ino;
     directory = where;
     socketPath = *path;
-    server = std::make_unique<QLocalServer>();
-    server->listen(socket.release());
+    startListening(std::move(made));
     return Outcome::listening;
+}
+
+PortListener::Outcome PortListener::adopt(FileDescriptor listening, const PortDirectory& where,
+                                          const std::string& name, std::string& why)
+{
+    close();
+    const auto path = where.socketPath(name, why);
+    if (!path)
+        return Outcome::failed;
+    const auto boundTo = pathOfListener(listening.get());
+    if (!boundTo) {
+        why = "the socket that was passed is not a Unix-domain stream socket that listens";
+        return Outcome::failed;
+    }
+    if (*boundTo != *path) {
+        why = fmt::format("{}: the socket that was passed listens at {}", *path, *boundTo);
+        return Outcome::failed;
+    }
+    ::fcntl(listening.get(), F_SETFL, ::fcntl(listening.get(), F_GETFL) | O_NONBLOCK);
+    directory.reset();
+    socketPath = *path;
+    startListening(std::move(listening));
+    return Outcome::listening;
+}
+
+void PortListener::startListening(FileDescriptor listening)
+{
+    socket = std::move(listening);
+    notifier = std::make_unique<QSocketNotifier>(socket.get(), QSocketNotifier::Read);
+    notifier->setEnabled(false);
+    QObject::connect(notifier.get(), &QSocketNotifier::activated, notifier.get(), [this] { acceptSome(); });
 }
 
 void PortListener::acceptConnections(ConnectionCallback callback)
 {
     connectionCallback = std::make_shared<ConnectionCallback>(std::move(callback));
-    if (!server)
-        return;
-    QObject::connect(server.get(), &QLocalServer::newConnection, server.get(), [this] { acceptPending(); });
-    QTimer::singleShot(0, server.get(), [this] { acceptPending(); });
+    if (notifier)
+        notifier->setEnabled(true);
 }
 
-void PortListener::acceptPending()
+void PortListener::acceptSome()
 {
     accepting = true;
-    while (server) {
-        std::unique_ptr<QLocalSocket> socket(server->nextPendingConnection());
-        if (!socket)
+    for (int accepted = 0; socket && accepted < kAcceptedPerTurn; ++accepted) {
+        FileDescriptor connected(::accept4(socket.get(), nullptr, nullptr, SOCK_CLOEXEC | SOCK_NONBLOCK));
+        if (!connected) {
+            if (errno == EMFILE || errno == ENFILE || errno == ENOBUFS || errno == ENOMEM)
+                pauseAccepting();
             break;
+        }
+        auto peer = std::make_unique<QLocalSocket>();
+        if (!peer->setSocketDescriptor(connected.get()))
+            continue;
+        connected.release();
         std::string why;
         const auto callback = connectionCallback;
-        if (auto connection = PortConnection::adopt(std::move(socket), why))
+        if (auto connection = PortConnection::adopt(std::move(peer), why))
             callAtBoundary(*callback, std::move(connection));
     }
     accepting = false;
 }
 
+/// What waits would otherwise wake the event loop without end.
+void PortListener::pauseAccepting()
+{
+    notifier->setEnabled(false);
+    QTimer::singleShot(kPauseWithoutDescriptors, notifier.get(),
+                       [waiting = notifier.get()] { waiting->setEnabled(true); });
+}
+
 void PortListener::close()
 {
-    if (!server)
+    if (!socket)
         return;
     std::string why;
-    if (const FileDescriptor lock = directory->lock(why)) {
+    if (const FileDescriptor lock = directory ? directory->lock(why) : FileDescriptor()) {
         struct stat status = {};
         if (::lstat(socketPath.c_str(), &status) == 0 && status.st_dev == device && status.st_ino == inode)
             ::unlink(socketPath.c_str());
     }
-    server->disconnect();
-    server->close();
+    notifier->setEnabled(false);
     if (accepting)
-        server.release()->deleteLater(); // inside its own signal
-    server.reset();
+        notifier.release()->deleteLater(); // inside its own signal
+    notifier.reset();
+    socket.close();
 }
 
 } // namespace pelorus

@@ -30,7 +30,7 @@ void refuseRequest(PortConnection& connection, const Frame& frame)
 LogChannel::LogChannel(Setup parts) : setup(std::move(parts))
 {
     setup.client->onFrame(refuseRequest); // nothing is expected there, but its end is to be seen
-    setup.client->onClosed([this](PortConnection&) { end("the client's port is gone"); });
+    setup.client->onClosed([this](PortConnection&) { end("client gone, the client's port is gone"); });
     setup.client->onDrained(
         [this](PortConnection&) {
             if (waitsForRoom)
@@ -42,11 +42,15 @@ LogChannel::LogChannel(Setup parts) : setup(std::move(parts))
 
     patienceTimer.setSingleShot(true);
     QObject::connect(&patienceTimer, &QTimer::timeout, &patienceTimer,
-                     [this] { end("the client did not connect to its command port"); });
+                     [this] { end("client gone, the client did not connect to its command port"); });
     patienceTimer.start(setup.patience);
     pumpTimer.setSingleShot(true);
     pumpTimer.setTimerType(Qt::PreciseTimer);
     QObject::connect(&pumpTimer, &QTimer::timeout, &pumpTimer, [this] { pump(); });
+    setup.stream.onMore([this] {
+        if (sinceStart.isValid() && !hasEnded)
+            pump();
+    });
 }
 
 LogChannel::~LogChannel()
@@ -65,7 +69,7 @@ void LogChannel::takeCommandConnection(std::shared_ptr<PortConnection> connectio
         return; // the port is one client's; whoever else comes is hung up on
     patienceTimer.stop();
     commands = std::move(connection);
-    commands->onClosed([this](PortConnection&) { end("the client closed its command port"); });
+    commands->onClosed([this](PortConnection&) { end("client gone, the client closed its command port"); });
     commands->onFrame([this](PortConnection& from, const Frame& frame) { handle(from, frame); });
 }
 
@@ -129,6 +133,8 @@ void LogChannel::pump()
     case MessageStream::Wait::forTurn:
         pumpTimer.start(0ms);
         break;
+    case MessageStream::Wait::forMore:
+        break;
     case MessageStream::Wait::atEnd:
         if (!atEnd)
             say("that was the last message");
@@ -149,12 +155,17 @@ void LogChannel::send(std::span<const std::byte> message)
         setup.recorder->record(message);
 }
 
-void LogChannel::end(const char* reason)
+void LogChannel::drop(const std::string& reason)
+{
+    end("dropped, " + reason);
+}
+
+void LogChannel::end(const std::string& how)
 {
     if (hasEnded)
         return;
     hasEnded = true;
-    say(fmt::format("client gone, {}", reason));
+    say(how);
     close();
     setup.ended();
 }

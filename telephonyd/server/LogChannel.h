@@ -33,6 +33,9 @@ public:
     LogChannel(const LogChannel&) = delete;
     LogChannel& operator=(const LogChannel&) = delete;
 
+    /// Closes both ports, so that the client comes back and asks anew.
+    void drop(const std::string& reason);
+
 private:
     void takeCommandConnection(std::shared_ptr<PortConnection> connection);
     void handle(PortConnection& connection, const Frame& frame);
@@ -41,7 +44,7 @@ private:
     void pump();
     bool hasRoom(std::size_t length) const override;
     void send(std::span<const std::byte> message) override;
-    void end(const char* reason);
+    void end(const std::string& how);
     void close();
     void say(const std::string& what) const;
 

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "telephonyd/server/Subscription.h"
+
 #include <chrono>
 #include <cstddef>
 #include <functional>
@@ -23,10 +25,15 @@ public:
     MessageSource(const MessageSource&) = delete;
     MessageSource& operator=(const MessageSource&) = delete;
 
-    /// False when there are no more.
+    /// False when there are no more, or none yet.
     virtual bool next(SourceMessage& message) = 0;
     /// Goes back to the first message. False when that cannot be done.
     virtual bool rewind() = 0;
+    /// What the client asked for, told before the first message is taken and whenever it changes.
+    virtual void subscribe(const Subscription&) {}
+    /// For a source that has no end: `more` is called, from the event loop, when next() has something again.
+    /// False when the source ends.
+    virtual bool awaitMore(std::function<void()> /*more*/) { return false; }
 };
 
 /// Makes the source of a new channel. Null when there is none; `why` is then one line.

@@ -9,6 +9,7 @@ MessageStream::MessageStream(std::unique_ptr<MessageSource> source, Pace pace, b
 void MessageStream::subscribe(Subscription wanted)
 {
     subscription = std::move(wanted);
+    source->subscribe(subscription);
     if (pending)
         pending = subscription.wants(message.bytes);
     if (ended && loop) // there was nothing for the subscription before
@@ -39,7 +40,11 @@ MessageStream::Pause MessageStream::run(Pace::Time now, MessageSink& sink)
         if (looked == kMessagesPerTurn)
             return {Wait::forTurn};
         if (!pending) {
-            ended = !takeNext();
+            if (!takeNext()) {
+                if (endless)
+                    return {Wait::forMore};
+                ended = true;
+            }
             if (!pending)
                 continue;
         }

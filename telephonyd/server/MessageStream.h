@@ -2,7 +2,6 @@
 
 #include "telephonyd/server/MessageSource.h"
 #include "telephonyd/server/Pace.h"
-#include "telephonyd/server/Subscription.h"
 
 namespace pelorus {
 
@@ -20,7 +19,7 @@ public:
 /// clocks nor sockets: it is told the time, and tells what it waits for.
 class MessageStream {
 public:
-    enum class Wait { untilDue, forRoom, forTurn, atEnd };
+    enum class Wait { untilDue, forRoom, forTurn, forMore, atEnd };
     struct Pause {
         Wait wait;
         Pace::Time due{}; // with untilDue
@@ -32,6 +31,8 @@ public:
 
     /// Replaces the subscription; before there is one, nothing is sent.
     void subscribe(Subscription wanted);
+    /// Called when a stream that waited forMore has some.
+    void onMore(std::function<void()> callback) { endless = source->awaitMore(std::move(callback)); }
     /// Sends what is due `now`, counted from the start of the stream.
     Pause run(Pace::Time now, MessageSink& sink);
 
@@ -46,6 +47,7 @@ private:
     SourceMessage message;
     bool pending = false; // `message` is still to be sent
     bool ended = false;
+    bool endless = false;
     bool sentThisRound = false;
 };
 

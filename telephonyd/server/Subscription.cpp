@@ -69,7 +69,12 @@ bool Subscription::wants(std::span<const std::byte> message) const
     if (everything)
         return true;
     const auto code = logCodeOf(message);
-    return code && (*code < kCodes ? basebandCodes : serverCodes).test(*code % kCodes);
+    return code && wants(*code);
+}
+
+bool Subscription::wants(std::uint32_t code) const
+{
+    return everything || (code < kCodes ? basebandCodes : serverCodes).test(code % kCodes);
 }
 
 std::string Subscription::description() const

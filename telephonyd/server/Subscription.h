@@ -15,6 +15,7 @@ public:
     static Subscription toEverything();
 
     bool wants(std::span<const std::byte> message) const;
+    bool wants(std::uint32_t code) const;
     /// In words.
     std::string description() const;
 

@@ -52,6 +52,11 @@ PortListener::Outcome TelephonyServer::listen(std::string& why)
     return listener.listen(directory, kServerPort, why);
 }
 
+PortListener::Outcome TelephonyServer::listenOn(FileDescriptor socket, std::string& why)
+{
+    return listener.adopt(std::move(socket), directory, kServerPort, why);
+}
+
 void TelephonyServer::acceptClients()
 {
     listener.acceptConnections(
@@ -79,11 +84,12 @@ void TelephonyServer::handle(PortConnection& connection, const Frame& frame)
     std::string why;
     const Error error = createChannel(requestedPort(frame.payload), remotePort, why);
     const auto reply = makeDictionary({{"Error", static_cast<int>(error)}});
-    if (error == none)
+    if (error == none) {
         reply->set("RemotePort", remotePort);
-    else
-        settings.report(
-            fmt::format("{}: no channel (error {}): {}", settings.technology, static_cast<int>(error), why));
+        lastRefusal.clear();
+    } else {
+        reportRefusal(error, why);
+    }
     connection.reply(frame, serializePropertyList(reply));
 }
 
@@ -123,6 +129,33 @@ TelephonyServer::Error TelephonyServer::createChannel(const std::string& localPo
     settings.report(
         fmt::format("{}: channel {}: client connected, {}", settings.technology, number, localPort));
     return none;
+}
+
+void TelephonyServer::reportRefusal(Error error, const std::string& why)
+{
+    std::string line = fmt::format("no channel (error {}): {}", static_cast<int>(error), why);
+    if (!settings.technology.empty())
+        line = settings.technology + ": " + line;
+    if (line != lastRefusal)
+        settings.report(line);
+    lastRefusal = std::move(line);
+}
+
+void TelephonyServer::changeTechnology(const std::string& technology)
+{
+    if (technology == settings.technology)
+        return;
+    const std::string before = std::exchange(settings.technology, technology);
+    dropChannels(technology.empty()
+                     ? "its baseband is gone"
+                     : fmt::format("the technology is {} now, no longer {}", technology, before));
+}
+
+void TelephonyServer::dropChannels(const std::string& reason)
+{
+    const auto dropped = channels; // each removes itself
+    for (const auto& [number, channel] : dropped)
+        channel->drop(reason);
 }
 
 void TelephonyServer::remove(unsigned number)

@@ -24,6 +24,20 @@ protected:
     {
         return listener.listen(*PortDirectory::open(why), name, why);
     }
+    Outcome adopt(PortListener& listener, FileDescriptor socket)
+    {
+        return listener.adopt(std::move(socket), *PortDirectory::open(why), "port", why);
+    }
+    /// A bound socket, as the service manager makes one.
+    FileDescriptor socketAt(const std::string& name) const
+    {
+        FileDescriptor socket(::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
+        sockaddr_un address = {};
+        address.sun_family = AF_UNIX;
+        path(name).copy(address.sun_path, sizeof address.sun_path - 1);
+        EXPECT_EQ(::bind(socket.get(), reinterpret_cast<const sockaddr*>(&address), sizeof address), 0);
+        return socket;
+    }
     bool exists(const std::string& name) const { return ::access(path(name).c_str(), F_OK) == 0; }
 
     std::string why;
@@ -161,6 +175,35 @@ TEST_F(PortListenerTest, ClosesInsideItsOwnCallback)
     EXPECT_FALSE(listener.isListening());
     spinOnce();
     EXPECT_TRUE(kept->isOpen());
+}
+
+TEST_F(PortListenerTest, AdoptsASocketAndLeavesItsFile)
+{
+    FileDescriptor socket = socketAt("port");
+    ASSERT_EQ(::listen(socket.get(), 1), 0);
+    const RawPeer early = RawPeer::connectTo(path("port"));
+    PortListener listener;
+    ASSERT_EQ(adopt(listener, std::move(socket)), Outcome::listening) << why;
+    EXPECT_EQ(listener.path(), path("port"));
+    std::vector<std::shared_ptr<PortConnection>> connections;
+    listener.acceptConnections([&](auto connection) { connections.push_back(std::move(connection)); });
+    EXPECT_TRUE(spinUntil([&] { return connections.size() == 1; }));
+    listener.close();
+    EXPECT_FALSE(listener.isListening());
+    EXPECT_TRUE(exists("port")) << "who made it may listen on";
+}
+
+TEST_F(PortListenerTest, AdoptsNoSocketThatListensElsewhereOrNotAtAll)
+{
+    PortListener listener;
+    EXPECT_EQ(adopt(listener, socketAt("deaf")), Outcome::failed);
+    EXPECT_EQ(why, "the socket that was passed is not a Unix-domain stream socket that listens");
+    EXPECT_EQ(adopt(listener, FileDescriptor(::open("/dev/null", O_RDONLY))), Outcome::failed);
+    FileDescriptor elsewhere = socketAt("elsewhere");
+    ASSERT_EQ(::listen(elsewhere.get(), 1), 0);
+    EXPECT_EQ(adopt(listener, std::move(elsewhere)), Outcome::failed);
+    EXPECT_EQ(why, path("port") + ": the socket that was passed listens at " + path("elsewhere"));
+    EXPECT_FALSE(listener.isListening());
 }
 
 TEST_F(PortListenerTest, PeerOfAnotherUserIsDropped)

@@ -205,4 +205,34 @@ TEST(MessageStream, SendsAtARate)
     EXPECT_THAT(sink.marks, ElementsAre(1, 3, 5, 7));
 }
 
+TEST(MessageStream, OfAnEndlessSourceWaitsForMoreInsteadOfEnding)
+{
+    class Endless : public ScriptedSource {
+    public:
+        using ScriptedSource::ScriptedSource;
+        bool awaitMore(std::function<void()> callback) override
+        {
+            more = std::move(callback);
+            return true;
+        }
+        void subscribe(const Subscription& wanted) override { wantsFirst = wanted.wants(0x0001); }
+        std::function<void()> more;
+        bool wantsFirst = false;
+    };
+    auto owned = std::make_unique<Endless>(std::vector<Scripted>{{0s, 0x0001, 1}});
+    Endless& source = *owned;
+    MessageStream stream(std::move(owned), Pace::ownTiming(0), false);
+    ListSink sink;
+    int woken = 0;
+    stream.onMore([&] { ++woken; });
+    stream.subscribe(subscriptionTo({1}));
+    EXPECT_TRUE(source.wantsFirst);
+    EXPECT_EQ(stream.run(0s, sink).wait, Wait::forMore);
+    source.more();
+    EXPECT_EQ(woken, 1);
+    source.rewind(); // it has something again
+    EXPECT_EQ(stream.run(3s, sink).wait, Wait::forMore);
+    EXPECT_THAT(sink.marks, testing::ElementsAre(1, 1));
+}
+
 } // namespace pelorus::test

@@ -132,6 +132,28 @@ TEST_F(TelephonyServerTest, RefusesAChannelWithoutABaseband)
     TestClient client("client");
     EXPECT_EQ(client.createChannel(), 2);
     EXPECT_THAT(lines, ElementsAre("Osprey LTE: no channel (error 2): it is on fire"));
+    EXPECT_EQ(client.createChannel(), 2);
+    EXPECT_EQ(lines.size(), 1U) << "a client that tries again and again fills no log";
+}
+
+TEST_F(TelephonyServerTest, DropsItsChannelsWhenTheTechnologyChanges)
+{
+    serve(simulated());
+    TestClient client("client");
+    client.run();
+    server->changeTechnology("Osprey LTE"); // it is already
+    spinOnce();
+    EXPECT_TRUE(client.isOpen());
+    server->changeTechnology("Osprey GSM");
+    EXPECT_EQ(server->channelCount(), 0U);
+    EXPECT_TRUE(spinUntil([&] { return client.portClosed && client.commandsClosed; }));
+    EXPECT_EQ(lines.back(),
+              "Osprey LTE: channel 1: dropped, the technology is Osprey GSM now, no longer Osprey LTE");
+    EXPECT_EQ(client.createChannel(), 0);
+    client.connectCommands();
+    const auto reply = client.command(makeDictionary({{"GetTechnology", "GetTechnology"}}));
+    ASSERT_TRUE(reply);
+    EXPECT_EQ(*reply, Value(makeDictionary({{"GetTechnology", "Osprey GSM"}})));
 }
 
 TEST_F(TelephonyServerTest, RefusesMoreThan256Channels)
