@@ -59,7 +59,11 @@ void describe(CLI::App& command, Options& options)
             ->type_name("T")
             ->check(knownTechnology);
     auto* replay = source.add_option("--replay", options.replay, "play a recording")->type_name("RECORDING");
-    source.add_flag("--modem", options.modem, "read the machine's modem");
+    source
+        .add_option("--modem", options.modem,
+                    "read the machine's modem: the first one, or the one of that device identifier")
+        ->type_name("ID")
+        ->expected(0, 1);
     source.require_option(1);
 
     auto* technology =

@@ -10,7 +10,7 @@ namespace pelorus {
 struct Options {
     std::optional<std::string> simulate; // a technology identifier
     std::optional<std::string> replay;   // a recording
-    bool modem = false;
+    std::optional<std::string> modem;    // a device identifier, empty for the first modem
     std::optional<std::string> technology;
     double speed = 1;
     bool loop = false;

@@ -1,5 +1,7 @@
+#include "platform/linux/PassedSockets.h"
 #include "platform/linux/SignalWatch.h"
 #include "telephonyd/Options.h"
+#include "telephonyd/modem/ModemFeed.h"
 #include "telephonyd/server/ReplaySource.h"
 #include "telephonyd/server/SimulationSource.h"
 #include "telephonyd/server/TelephonyServer.h"
@@ -41,9 +43,21 @@ TelephonyServer::Settings settingsFor(const Options& options)
     settings.loop = options.loop;
     settings.report = report;
     settings.pace = options.rate ? Pace::rate(*options.rate) : Pace::ownTiming(options.speed);
-    settings.makeSource = options.replay ? ReplaySource::factory(*options.replay, report)
-                                         : SimulationSource::factory(*options.simulate, options.seed);
+    if (options.replay)
+        settings.makeSource = ReplaySource::factory(*options.replay, report);
+    else if (options.simulate)
+        settings.makeSource = SimulationSource::factory(*options.simulate, options.seed);
     return settings;
+}
+
+std::unique_ptr<ModemFeed> feedFor(const Options& options)
+{
+    if (!options.modem)
+        return nullptr;
+    ModemFeed::Settings settings;
+    settings.modem = QString::fromStdString(*options.modem);
+    settings.report = report;
+    return std::make_unique<ModemFeed>(std::move(settings));
 }
 
 bool isSameFile(const std::string& one, const std::string& other)
@@ -52,12 +66,42 @@ bool isSameFile(const std::string& one, const std::string& other)
     return std::filesystem::equivalent(one, other, ignored);
 }
 
+/// On the socket that the service manager passed, or on one of its own.
+bool listen(TelephonyServer& server, std::string& why)
+{
+    std::vector<FileDescriptor> passed = takePassedSockets();
+    if (passed.empty())
+        return server.listen(why) == PortListener::Outcome::listening;
+    if (passed.size() > 1) {
+        why = fmt::format("{} sockets were passed, there is use for one", passed.size());
+        return false;
+    }
+    return server.listenOn(std::move(passed.front()), why) == PortListener::Outcome::listening;
+}
+
+/// Leaves the modem as it was found, unless that takes too long.
+void end(ModemFeed* feed)
+{
+    constexpr std::chrono::seconds patience(1);
+    QTimer::singleShot(patience, QCoreApplication::instance(), &QCoreApplication::quit);
+    if (feed)
+        feed->finish(&QCoreApplication::quit);
+    else
+        QCoreApplication::quit();
+}
+
 int serve(const Options& options)
 {
     std::string why;
+    const auto feed = feedFor(options); // outlives the server
+    const SignalWatch signals({SIGINT, SIGTERM}, [&feed](int) { end(feed.get()); });
     TelephonyServer::Settings settings = settingsFor(options);
-    if (!settings.makeSource(why)) // rather now than when the first client comes
+    if (feed) {
+        settings.makeSource = feed->sourceFactory();
+        settings.pace = Pace::ownTiming(0); // it is now that it tells of
+    } else if (!settings.makeSource(why)) { // rather now than when the first client comes
         return fail(why);
+    }
     if (options.replay && options.record && isSameFile(*options.replay, *options.record))
         return fail(fmt::format("{}: cannot be replayed and recorded to at once", *options.record));
 
@@ -66,7 +110,7 @@ int serve(const Options& options)
         return fail(why);
     std::unique_ptr<MessageRecorder> recorder; // outlives the server
     TelephonyServer server(*directory, std::move(settings));
-    if (server.listen(why) != PortListener::Outcome::listening)
+    if (!listen(server, why))
         return fail(why);
     if (options.record) { // not before it is clear that no other server writes it
         recorder = MessageRecorder::create(*options.record, report, why);
@@ -74,6 +118,11 @@ int serve(const Options& options)
             return fail(why);
         server.recordTo(*recorder);
     }
+    if (feed)
+        feed->start([&](const std::string& technology) {
+            server.changeTechnology(technology.empty() ? technology
+                                                       : options.technology.value_or(technology));
+        });
     server.acceptClients();
     report(fmt::format("listening on {}", server.path()));
     return QCoreApplication::exec();
@@ -87,10 +136,7 @@ int main(int argumentCount, char** arguments)
     const auto options = Options::parse(argumentCount, arguments, status);
     if (!options)
         return status;
-    if (options->modem)
-        return fail("--modem: this version cannot read a modem");
     raiseDescriptorLimit();
     QCoreApplication application(argumentCount, arguments);
-    const SignalWatch signals({SIGINT, SIGTERM}, [](int) { QCoreApplication::quit(); });
     return serve(*options);
 }

@@ -1,0 +1,75 @@
+#pragma once
+
+#include "telephonyd/modem/CellPoller.h"
+#include "telephonyd/server/MessageSource.h"
+
+#include <array>
+#include <set>
+
+namespace pelorus {
+
+class ModemSource;
+
+/// The machine's modem as channels see it: its technology, and the three lists that the telephony server
+/// makes of what it tells. Outlives the sources that it makes.
+class ModemFeed {
+public:
+    static constexpr std::uint32_t kSimFiles = 0xFF0000;
+    static constexpr std::uint32_t kCells = 0xFF0001;
+    static constexpr std::uint32_t kContexts = 0xFF0002;
+    static constexpr std::array kCodes = {kSimFiles, kCells, kContexts};
+
+    struct Settings {
+        QString modem; // a device identifier; empty for the first
+        ModemManagerClient::Settings client = {};
+        CellPoller::Settings polling = {};
+        std::chrono::milliseconds repetition = std::chrono::seconds(10); // of a list that does not change
+        Report report;
+    };
+
+    explicit ModemFeed(Settings settings);
+    ~ModemFeed();
+    ModemFeed(const ModemFeed&) = delete;
+    ModemFeed& operator=(const ModemFeed&) = delete;
+
+    /// `technologyChanged` is told the answer to "GetTechnology", empty while there is no modem.
+    void start(std::function<void(const std::string& technology)> technologyChanged);
+    /// Null while there is no modem.
+    SourceFactory sourceFactory();
+    /// Leaves the modem as it was found, then calls `done`.
+    void finish(std::function<void()> done);
+
+    // For the sources.
+    void add(ModemSource& source);
+    void remove(ModemSource& source);
+    void handleWishes();
+    /// A property list; empty while it is not known.
+    const std::vector<std::byte>& list(std::uint32_t code) const { return lists[code - kSimFiles]; }
+    std::chrono::milliseconds repetition() const { return settings.repetition; }
+
+private:
+    void update();
+    void choose();
+    void followObjects();
+    void updateTechnology();
+    void updateLists();
+    std::vector<std::byte> contextList() const;
+    Value cellList() const;
+    QStringList bearerPaths() const;
+    QString simPath() const;
+    QVariantMap modemProperties() const;
+    void reportState();
+
+    Settings settings;
+    Complaints complaints;
+    ModemManagerClient client;
+    std::function<void(const std::string&)> technologyChanged;
+    std::string technology;
+    QString modem; // the chosen one's path
+    std::unique_ptr<CellPoller> poller;
+    std::set<ModemSource*> sources;
+    std::array<std::vector<std::byte>, kCodes.size()> lists;
+    bool polled = false;
+};
+
+} // namespace pelorus
