@@ -3,7 +3,7 @@
 import socket
 import threading
 
-# What an LTE-less world of 3GPP TS 27.007 answers, just enough to be registered; a list of lines by command.
+# Just enough to be registered on LTE (3GPP TS 27.007), lines by command. What is not here is an error.
 ANSWERS = {
     "": [], "E0": [], "V1": [], "X4": [], "&C1": [], "+CMEE=1": [], "+IFC=1,1": [], "Z": [], "&F": [],
     "+GCAP": ["+GCAP: +CGSM"],
@@ -80,6 +80,7 @@ class AtModem:
         return "".join("\r\n%s\r\n" % line for line in lines) + "\r\nOK\r\n"
 
     def close(self):
+        self.listener.shutdown(socket.SHUT_RDWR)  # wakes who waits in accept()
         self.listener.close()
         for connection in self.connections:
             connection.close()
