@@ -119,11 +119,14 @@ int serve(const Options& options)
         server.recordTo(*recorder);
     }
     if (feed)
-        feed->start([&](const std::string& technology) {
-            server.changeTechnology(technology.empty() ? technology
-                                                       : options.technology.value_or(technology));
-        });
-    server.acceptClients();
+        feed->start({.technologyChanged =
+                         [&](const std::string& technology) {
+                             server.changeTechnology(
+                                 technology.empty() ? technology : options.technology.value_or(technology));
+                         },
+                     .asked = [&server] { server.acceptClients(); }});
+    else
+        server.acceptClients();
     report(fmt::format("listening on {}", server.path()));
     return QCoreApplication::exec();
 }

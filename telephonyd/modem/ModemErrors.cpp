@@ -17,6 +17,8 @@ std::string lost(const QString& what)
         return "the serving cell's area and identity are not shown";
     if (what == QLatin1String("Signal.Setup"))
         return "the serving cell's levels are not shown";
+    if (what == QLatin1String("Properties.GetAll"))
+        return "the SIM's files or a data context are not shown";
     return "there is no modem without it";
 }
 
@@ -45,6 +47,12 @@ const char* cure(const QString& what, const QString& error)
 bool isUnsupported(const QString& errorName)
 {
     return errorName == kModemErrors + QLatin1String("Unsupported") ||
+           errorName == kBusErrors + QLatin1String("UnknownMethod");
+}
+
+bool isObjectMissing(const QString& errorName)
+{
+    return errorName == kBusErrors + QLatin1String("UnknownObject") ||
            errorName == kBusErrors + QLatin1String("UnknownMethod");
 }
 

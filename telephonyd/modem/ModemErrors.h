@@ -13,6 +13,8 @@ std::string explainError(const QString& what, const QString& errorName, const QS
 
 /// The error by which a modem says that it never can.
 bool isUnsupported(const QString& errorName);
+/// The object is not there, or no longer.
+bool isObjectMissing(const QString& errorName);
 /// There is no ModemManager, and none can be started.
 bool isServiceMissing(const QString& errorName);
 

@@ -1,10 +1,7 @@
 #include "telephonyd/modem/ModemFeed.h"
 
-#include "telephonyd/modem/BearerRows.h"
-#include "telephonyd/modem/ModemCells.h"
 #include "telephonyd/modem/ModemChoice.h"
 #include "telephonyd/modem/ModemNames.h"
-#include "telephonyd/modem/ModemSimFiles.h"
 #include "telephonyd/modem/ModemSource.h"
 #include "telephonyd/modem/PlainValue.h"
 #include "telephonyd/simulation/PacketList.h"
@@ -18,17 +15,8 @@ namespace {
 
 using namespace ModemNames;
 
-bool isPath(const QString& path)
-{
-    return path.size() > 1; // "/" stands for none
-}
-
-QString signalKey(CellKind kind)
-{
-    return kind == CellKind::lte    ? QStringLiteral("Lte")
-           : kind == CellKind::umts ? QStringLiteral("Umts")
-                                    : QStringLiteral("Gsm");
-}
+/// Clients wait a second for an answer of the server.
+constexpr std::chrono::milliseconds kLongestQuestion{700};
 
 std::string stateText(int state)
 {
@@ -45,15 +33,26 @@ std::string stateText(int state)
 } // namespace
 
 ModemFeed::ModemFeed(Settings given)
-    : settings(std::move(given)), complaints(settings.report), client(settings.client, complaints)
+    : settings(std::move(given)), complaints(settings.report), client(settings.client, complaints),
+      view(client.objects())
 {}
 
 ModemFeed::~ModemFeed() = default;
 
-void ModemFeed::start(std::function<void(const std::string&)> callback)
+void ModemFeed::start(Callbacks whatToCall)
 {
-    technologyChanged = std::move(callback);
-    client.start([this] { update(); });
+    callbacks = std::move(whatToCall);
+    QTimer::singleShot(kLongestQuestion, &lifetime, [this] { endQuestion(); });
+    client.start([this] {
+        update();
+        endQuestion();
+    });
+}
+
+void ModemFeed::endQuestion()
+{
+    if (const auto asked = std::exchange(callbacks.asked, nullptr))
+        asked();
 }
 
 SourceFactory ModemFeed::sourceFactory()
@@ -104,16 +103,11 @@ void ModemFeed::handleWishes()
 void ModemFeed::update()
 {
     choose();
-    followObjects();
+    client.follow(view.companions());
     updateTechnology();
     if (poller)
         poller->refresh();
     updateLists();
-}
-
-QVariantMap ModemFeed::modemProperties() const
-{
-    return client.objects().properties(modem, kModem);
 }
 
 void ModemFeed::choose()
@@ -124,6 +118,8 @@ void ModemFeed::choose()
             poller->stop(); // of one that is still there
         poller.reset();
         modem = chosen;
+        view.look(modem);
+        lastOnNetwork.clear();
         for (const char* topic : {"GetCellInfo", "GetLocation", "Signal.Setup", "Location.Setup"})
             complaints.isOver(topic); // the next one's own
         if (!modem.isEmpty()) {
@@ -146,7 +142,7 @@ void ModemFeed::reportState()
             complaints.isOver("modem");
         return;
     }
-    const QVariantMap properties = modemProperties();
+    const QVariantMap properties = view.properties();
     complaints.say("modem",
                    fmt::format("modem: {} {}, device identifier {}", textAt(properties, "Manufacturer"),
                                textAt(properties, "Model"), textAt(properties, "DeviceIdentifier")));
@@ -156,85 +152,34 @@ void ModemFeed::reportState()
         complaints.isOver("state");
 }
 
-QString ModemFeed::simPath() const
-{
-    return modemProperties().value(QStringLiteral("Sim")).toString();
-}
-
-QStringList ModemFeed::bearerPaths() const
-{
-    QStringList paths;
-    for (const QVariant& path : listAt(modemProperties(), "Bearers"))
-        paths.append(path.toString());
-    const QString initial =
-        client.objects().properties(modem, kModem3gpp).value(QStringLiteral("InitialEpsBearer")).toString();
-    if (!paths.contains(initial))
-        paths.prepend(initial);
-    paths.removeIf([](const QString& path) { return !isPath(path); });
-    return paths;
-}
-
-void ModemFeed::followObjects()
-{
-    QMap<QString, QString> wanted;
-    if (isPath(simPath()))
-        wanted.insert(simPath(), kSim);
-    for (const QString& path : bearerPaths())
-        wanted.insert(path, kBearer);
-    client.follow(wanted);
-}
-
 void ModemFeed::updateTechnology()
 {
     std::string now;
-    if (!modem.isEmpty()) {
-        const QVariantMap properties = modemProperties();
-        now = technologyOn(servingKind(unsignedAt(properties, "AccessTechnologies").value_or(0)));
-        if (now.empty()) // a modem that lost its network is likely to find the same again
-            now = technology;
+    if (view.isThere()) {
+        now = technologyOn(view.servingKind());
+        if (now.empty()) // who lost a network is likely to find the same again
+            now = lastOnNetwork;
+        lastOnNetwork = now;
         if (now.empty())
-            now = technologyAbleTo(unsignedAt(properties, "CurrentCapabilities").value_or(0));
+            now = technologyAbleTo(unsignedAt(view.properties(), "CurrentCapabilities").value_or(0));
     }
     if (now == technology)
         return;
     technology = now;
-    technologyChanged(technology);
-}
-
-Value ModemFeed::cellList() const
-{
-    const ObjectTree& objects = client.objects();
-    const QVariantMap properties = modemProperties();
-    ServingCellFacts facts;
-    facts.kind = servingKind(unsignedAt(properties, "AccessTechnologies").value_or(0));
-    facts.location = poller->location();
-    facts.operatorCode = OperatorCode::parse(textAt(objects.properties(modem, kModem3gpp), "OperatorCode"));
-    facts.signal = objects.properties(modem, kSignal).value(signalKey(facts.kind)).toMap();
-    facts.bands = listAt(properties, "CurrentBands");
-    return cellMonitorList(poller->cells(), facts);
-}
-
-std::vector<std::byte> ModemFeed::contextList() const
-{
-    auto contexts = makeArray();
-    for (const QString& path : bearerPaths()) {
-        if (!client.objects().has(path, kBearer))
-            continue; // not told of yet
-        contexts->elements.push_back(bearerRows(path, client.objects().properties(path, kBearer)));
-    }
-    return packetList(contexts);
+    callbacks.technologyChanged(technology);
 }
 
 void ModemFeed::updateLists()
 {
     lists = {};
-    if (!modem.isEmpty()) {
-        const QString sim = simPath();
-        if (!isPath(sim) || client.objects().has(sim, kSim))
-            lists[kSimFiles - kSimFiles] =
-                packetList(simFilesOf(client.objects().properties(sim, kSim), modemProperties()));
-        lists[kCells - kSimFiles] = packetList(cellList());
-        lists[kContexts - kSimFiles] = contextList();
+    if (view.isThere()) {
+        const auto put = [this](std::uint32_t code, const Value& list) {
+            if (list)
+                lists[code - kSimFiles] = packetList(list);
+        };
+        put(kSimFiles, view.simFiles());
+        put(kCells, view.cells(poller->cells(), poller->location()));
+        put(kContexts, view.contexts());
     }
     const auto told = sources; // one that is told may go
     for (ModemSource* source : told)

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "telephonyd/modem/CellPoller.h"
+#include "telephonyd/modem/ModemView.h"
 #include "telephonyd/server/MessageSource.h"
 
 #include <array>
@@ -32,8 +33,14 @@ public:
     ModemFeed(const ModemFeed&) = delete;
     ModemFeed& operator=(const ModemFeed&) = delete;
 
-    /// `technologyChanged` is told the answer to "GetTechnology", empty while there is no modem.
-    void start(std::function<void(const std::string& technology)> technologyChanged);
+    struct Callbacks {
+        /// Is told the answer to "GetTechnology", empty while there is no modem.
+        std::function<void(const std::string& technology)> technologyChanged;
+        /// Called once, within a second: whether there is a modem is known, or cannot be known yet. Clients
+        /// that are heard after that are not refused for coming first.
+        std::function<void()> asked;
+    };
+    void start(Callbacks callbacks);
     /// Null while there is no modem.
     SourceFactory sourceFactory();
     /// Leaves the modem as it was found, then calls `done`.
@@ -49,27 +56,25 @@ public:
 
 private:
     void update();
+    void endQuestion();
     void choose();
-    void followObjects();
     void updateTechnology();
     void updateLists();
-    std::vector<std::byte> contextList() const;
-    Value cellList() const;
-    QStringList bearerPaths() const;
-    QString simPath() const;
-    QVariantMap modemProperties() const;
     void reportState();
 
     Settings settings;
     Complaints complaints;
     ModemManagerClient client;
-    std::function<void(const std::string&)> technologyChanged;
+    ModemView view; // of the chosen modem
+    Callbacks callbacks;
     std::string technology;
-    QString modem; // the chosen one's path
+    std::string lastOnNetwork; // the technology that this modem was on
+    QString modem;             // the chosen one's path
     std::unique_ptr<CellPoller> poller;
     std::set<ModemSource*> sources;
     std::array<std::vector<std::byte>, kCodes.size()> lists;
     bool polled = false;
+    QObject lifetime; // of what waits for a timer
 };
 
 } // namespace pelorus

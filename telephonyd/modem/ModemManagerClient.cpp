@@ -177,8 +177,10 @@ void ModemManagerClient::getProperties(const QString& path, const QString& inter
     call(path, kProperties, QStringLiteral("GetAll"), {interface},
          [this, path, interface](const QDBusMessage& reply) {
              if (isError(reply)) {
-                 complaints.say(path.toStdString(), explainError(QStringLiteral("Properties.GetAll"),
-                                                                 reply.errorName(), reply.errorMessage()));
+                 if (!isObjectMissing(reply.errorName())) // it went while it was asked for
+                     complaints.say(path.toStdString(),
+                                    explainError(QStringLiteral("Properties.GetAll"), reply.errorName(),
+                                                 reply.errorMessage()));
                  retryTimer.start();
                  return;
              }

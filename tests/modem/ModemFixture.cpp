@@ -59,10 +59,11 @@ void ModemFixture::serve(const QString& modem)
     server.emplace(*PortDirectory::open(why), std::move(serverSettings));
     ASSERT_EQ(server->listen(why), PortListener::Outcome::listening) << why;
     server->acceptClients();
-    feed->start([this](const std::string& technology) {
-        technologies.push_back(technology);
-        server->changeTechnology(technology);
-    });
+    feed->start({[this](const std::string& technology) {
+                     technologies.push_back(technology);
+                     server->changeTechnology(technology);
+                 },
+                 {}});
 }
 
 FakeInterfaces ModemFixture::lteModem()
