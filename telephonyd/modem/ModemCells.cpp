@@ -25,6 +25,8 @@ constexpr std::uint32_t kMostPhysicalIdentity = 503;
 constexpr std::uint32_t kMostReceiveLevel = 63;
 constexpr double kLevelOfReceiveLevel0 = -110; // dBm (3GPP TS 45.008, 8.1.4)
 
+constexpr std::size_t kMostCells = 128; // far more than any modem measures
+
 std::string_view technologyName(CellKind kind)
 {
     return kind == CellKind::lte ? kLTE : kind == CellKind::umts ? kUMTS : kGSM;
@@ -218,6 +220,8 @@ Value cellMonitorList(const QVariantList& infos, const ServingCellFacts& facts)
     const Value known = servingCell(facts);
     bool hasServing = false;
     for (const QVariant& info : infos) {
+        if (list->elements.size() == kMostCells)
+            break;
         const Value cell = cellOf(info.toMap());
         if (!cell)
             continue;

@@ -5,7 +5,9 @@
 
 #include <QDir>
 #include <algorithm>
+#include <ctime>
 #include <fcntl.h>
+#include <sys/resource.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
 #include <sys/un.h>
@@ -204,6 +206,29 @@ TEST_F(PortListenerTest, AdoptsNoSocketThatListensElsewhereOrNotAtAll)
     EXPECT_EQ(adopt(listener, std::move(elsewhere)), Outcome::failed);
     EXPECT_EQ(why, path("port") + ": the socket that was passed listens at " + path("elsewhere"));
     EXPECT_FALSE(listener.isListening());
+}
+
+TEST_F(PortListenerTest, WaitsWithoutHasteWhenTheProcessHasNoDescriptorsLeft)
+{
+    PortListener listener;
+    ASSERT_EQ(listen(listener), Outcome::listening);
+    const RawPeer peer = RawPeer::connectTo(path("port"));
+    rlimit limit = {};
+    ASSERT_EQ(::getrlimit(RLIMIT_NOFILE, &limit), 0);
+    const rlimit none = {.rlim_cur = 3, .rlim_max = limit.rlim_max};
+    std::vector<std::shared_ptr<PortConnection>> connections;
+    listener.acceptConnections([&](auto connection) { connections.push_back(std::move(connection)); });
+    ASSERT_EQ(::setrlimit(RLIMIT_NOFILE, &none), 0);
+    const std::clock_t before = std::clock();
+    bool over = false;
+    QTimer::singleShot(250, QCoreApplication::instance(), [&over] { over = true; });
+    while (!over)
+        QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
+    const double busy = static_cast<double>(std::clock() - before) / CLOCKS_PER_SEC;
+    ::setrlimit(RLIMIT_NOFILE, &limit);
+    EXPECT_LT(busy, 0.1);
+    EXPECT_EQ(connections.size(), 0U);
+    EXPECT_TRUE(spinUntil([&] { return connections.size() == 1; }));
 }
 
 TEST_F(PortListenerTest, PeerOfAnotherUserIsDropped)

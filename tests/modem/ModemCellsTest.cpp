@@ -223,6 +223,12 @@ TEST(ModemCells, GapsAreNotFilledFromAnotherCell)
               "CellId=19178252 PID=416 BandInfo=3 UARFCN=1300 RSCP=-95 ECN0=-11");
 }
 
+TEST(ModemCells, NoMoreThan128)
+{
+    const QVariantMap neighbour = {{"cell-type", 2U}, {"arfcn", 62U}};
+    EXPECT_EQ(cellMonitorList(QVariantList(5000, neighbour), {}).array()->elements.size(), 128U);
+}
+
 TEST(ModemCells, NeighboursAloneComeBehindTheServingCellThatIsKnown)
 {
     const QVariantMap neighbour = {{"cell-type", 3U}, {"uarfcn", 10562U}, {"psc", 7U}, {"rscp", -99.0}};
