@@ -263,9 +263,9 @@ class OnDemandTest(Scratch):
     @unittest.skipUnless(shutil.which("systemd-analyze"), "systemd-analyze is not installed")
     def test_the_units_are_right(self):
         units = HERE.parent.parent / "resources/systemd"
-        text = (units / "pelorus-telephonyd.service.in").read_text(encoding="utf-8")
+        text = (units / "pelorus-telephonyd.service").read_text(encoding="utf-8")
         program = os.path.dirname(os.path.abspath(TELEPHONYD))
-        self.write("pelorus-telephonyd.service", re.sub("@.*@", program, text).encode())
+        self.write("pelorus-telephonyd.service", re.sub("(?m)^ExecStart=", "ExecStart=%s/" % program, text).encode())
         shutil.copy(units / "pelorus-telephonyd.socket", self.directory)
         run = subprocess.run(["systemd-analyze", "verify", "--user", "--man=no", self.path("pelorus-telephonyd.socket"),
                               self.path("pelorus-telephonyd.service")],
