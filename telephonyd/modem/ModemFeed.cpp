@@ -37,7 +37,11 @@ ModemFeed::ModemFeed(Settings given)
       view(client.objects())
 {}
 
-ModemFeed::~ModemFeed() = default;
+ModemFeed::~ModemFeed()
+{
+    for (ModemSource* source : sources)
+        source->detach();
+}
 
 void ModemFeed::start(Callbacks whatToCall)
 {

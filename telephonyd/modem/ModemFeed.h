@@ -12,7 +12,7 @@ namespace pelorus {
 class ModemSource;
 
 /// The machine's modem as channels see it: its technology, and the three lists that the telephony server
-/// makes of what it tells. Outlives the sources that it makes.
+/// makes of what it tells.
 class ModemFeed {
 public:
     static constexpr std::uint32_t kSimFiles = 0xFF0000;

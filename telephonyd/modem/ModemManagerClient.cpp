@@ -3,8 +3,6 @@
 #include "telephonyd/modem/ModemNames.h"
 #include "telephonyd/modem/PlainValue.h"
 
-#include <set>
-
 namespace pelorus {
 
 namespace {
@@ -52,7 +50,7 @@ void ModemManagerClient::start(std::function<void()> callback)
                   },
               .lost =
                   [this](const std::string& why) {
-                      serviceWatches.clear();
+                      watches.clear();
                       const std::string line = "the system bus cannot be reached: " + why;
                       complaints.say("bus", "modem: " + line + "; trying again");
                       forgetService(line);
@@ -68,26 +66,40 @@ ModemManagerClient::fromService(void (ModemManagerClient::*handler)(const QDBusM
     };
 }
 
+/// Before anything is asked for, so that no change is missed. Of changes of properties only those of the
+/// interfaces that count: the system bus is full of others'.
 void ModemManagerClient::subscribeToService()
 {
-    serviceWatches.clear();
-    serviceWatches.push_back(bus.subscribe(kBusService, kBusPath, kBusService,
-                                           QStringLiteral("NameOwnerChanged"),
-                                           [this](const QDBusMessage& signal) {
-                                               if (argument(signal, 0).toString() == kService)
-                                                   handleOwner(argument(signal, 2).toString());
-                                           }));
-    serviceWatches.push_back(bus.subscribe({}, kRoot, kObjectManager, QStringLiteral("InterfacesAdded"),
-                                           fromService(&ModemManagerClient::handleInterfacesAdded)));
-    serviceWatches.push_back(bus.subscribe({}, kRoot, kObjectManager, QStringLiteral("InterfacesRemoved"),
-                                           fromService(&ModemManagerClient::handleInterfacesRemoved)));
+    watches.clear();
+    watches.push_back(
+        bus.subscribe({.service = kBusService,
+                       .path = kBusPath,
+                       .interface = kBusService,
+                       .signal = QStringLiteral("NameOwnerChanged"),
+                       .firstArguments = {kService}},
+                      [this](const QDBusMessage& signal) { handleOwner(argument(signal, 2).toString()); }));
+    watches.push_back(bus.subscribe(
+        {.path = kRoot, .interface = kObjectManager, .signal = QStringLiteral("InterfacesAdded")},
+        fromService(&ModemManagerClient::handleInterfacesAdded)));
+    watches.push_back(bus.subscribe(
+        {.path = kRoot, .interface = kObjectManager, .signal = QStringLiteral("InterfacesRemoved")},
+        fromService(&ModemManagerClient::handleInterfacesRemoved)));
+    for (const QString& interface : {kModem, kModem3gpp, kSignal, kLocation, kSim, kBearer})
+        watches.push_back(bus.subscribe({.interface = kProperties,
+                                         .signal = QStringLiteral("PropertiesChanged"),
+                                         .firstArguments = {interface}},
+                                        fromService(&ModemManagerClient::handlePropertiesChanged)));
 }
 
 void ModemManagerClient::handleOwner(const QString& newOwner)
 {
     if (newOwner == owner)
         return;
-    forgetService("ModemManager has ended; waiting for it");
+    if (!owner.isEmpty()) {
+        const std::string line = "ModemManager has ended; waiting for it";
+        complaints.say("service", "modem: " + line);
+        forgetService(line);
+    }
     if (!newOwner.isEmpty())
         getObjects();
 }
@@ -97,7 +109,6 @@ void ModemManagerClient::forgetService(const std::string& why)
     owner.clear();
     tree.clear();
     followed.clear();
-    watches.clear();
     trouble = why;
     changed();
 }
@@ -126,21 +137,18 @@ void ModemManagerClient::takeObjects(const QDBusMessage& reply)
     trouble.clear();
     tree.replace(argument(reply, 0).toMap());
     followed.clear();
-    updateWatches();
     changed();
 }
 
 void ModemManagerClient::handleInterfacesAdded(const QDBusMessage& signal)
 {
     tree.add(argument(signal, 0).toString(), argument(signal, 1).toMap());
-    updateWatches();
     changed();
 }
 
 void ModemManagerClient::handleInterfacesRemoved(const QDBusMessage& signal)
 {
     tree.remove(argument(signal, 0).toString(), argument(signal, 1).toList());
-    updateWatches();
     changed();
 }
 
@@ -152,24 +160,9 @@ void ModemManagerClient::follow(const QMap<QString, QString>& interfacesByPath)
     for (auto object = before.begin(); object != before.end(); ++object)
         if (!followed.contains(object.key()))
             tree.remove(object.key(), {object.value()});
-    updateWatches();
     for (auto object = followed.begin(); object != followed.end(); ++object)
         if (!before.contains(object.key()))
             getProperties(object.key(), object.value());
-}
-
-/// Each object's own signals only: the system bus is full of others' changes.
-void ModemManagerClient::updateWatches()
-{
-    const QStringList told = tree.paths();
-    std::set<QString> wanted(told.begin(), told.end());
-    for (const QString& path : followed.keys())
-        wanted.insert(path);
-    std::erase_if(watches, [&](const auto& watch) { return !wanted.contains(watch.first); });
-    for (const QString& path : wanted)
-        if (!watches.contains(path))
-            watches[path] = bus.subscribe({}, path, kProperties, QStringLiteral("PropertiesChanged"),
-                                          fromService(&ModemManagerClient::handlePropertiesChanged));
 }
 
 void ModemManagerClient::getProperties(const QString& path, const QString& interface)

@@ -39,7 +39,6 @@ private:
     void getObjects();
     void takeObjects(const QDBusMessage& reply);
     void getProperties(const QString& path, const QString& interface);
-    void updateWatches();
     void handlePropertiesChanged(const QDBusMessage& signal);
     void forgetService(const std::string& why);
     std::function<void(const QDBusMessage&)>
@@ -54,8 +53,7 @@ private:
     QString owner; // unique name of the service; empty while it is not known
     std::string trouble = "ModemManager has not answered yet";
     QMap<QString, QString> followed;
-    std::map<QString, std::unique_ptr<SignalRelay>> watches; // by path
-    std::vector<std::unique_ptr<SignalRelay>> serviceWatches;
+    std::vector<std::unique_ptr<SignalRelay>> watches;
     QTimer retryTimer;
     SystemBus bus; // the last, so that its replies end first
 };

@@ -18,26 +18,29 @@ std::vector<std::byte> messageOf(std::uint32_t code, std::span<const std::byte> 
 
 } // namespace
 
-ModemSource::ModemSource(ModemFeed& feed) : feed(feed)
+ModemSource::ModemSource(ModemFeed& from) : feed(&from)
 {
     timer.setSingleShot(true);
     QObject::connect(&timer, &QTimer::timeout, &timer, [this] { handleNews(); });
-    feed.add(*this);
+    feed->add(*this);
 }
 
 ModemSource::~ModemSource()
 {
-    feed.remove(*this);
+    if (feed)
+        feed->remove(*this);
 }
 
 bool ModemSource::next(SourceMessage& message)
 {
+    if (!feed)
+        return false;
     const auto now = Clock::now();
     for (std::size_t index = 0; index < sent.size(); ++index) {
         const std::uint32_t code = ModemFeed::kCodes[index];
-        const std::vector<std::byte>& list = feed.list(code);
+        const std::vector<std::byte>& list = feed->list(code);
         if (!wants(code) || list.empty() ||
-            (list == sent[index].list && now < sent[index].time + feed.repetition()))
+            (list == sent[index].list && now < sent[index].time + feed->repetition()))
             continue;
         sent[index] = {list, now};
         current = messageOf(code, list);
@@ -53,7 +56,7 @@ void ModemSource::arm()
     auto earliest = Clock::time_point::max();
     for (std::size_t index = 0; index < sent.size(); ++index)
         if (wants(ModemFeed::kCodes[index]) && !sent[index].list.empty())
-            earliest = std::min(earliest, sent[index].time + feed.repetition());
+            earliest = std::min(earliest, sent[index].time + feed->repetition());
     if (earliest == Clock::time_point::max())
         return;
     const auto wait = std::chrono::ceil<std::chrono::milliseconds>(earliest - Clock::now());
@@ -63,7 +66,8 @@ void ModemSource::arm()
 void ModemSource::subscribe(const Subscription& wanted)
 {
     subscription = wanted;
-    feed.handleWishes();
+    if (feed)
+        feed->handleWishes();
 }
 
 bool ModemSource::awaitMore(std::function<void()> callback)

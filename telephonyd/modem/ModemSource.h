@@ -8,7 +8,7 @@ namespace pelorus {
 /// that does not keep up gets what is so when it takes the next message, and never what was.
 class ModemSource : public MessageSource {
 public:
-    explicit ModemSource(ModemFeed& feed);
+    explicit ModemSource(ModemFeed& from);
     ~ModemSource() override;
 
     bool next(SourceMessage& message) override;
@@ -18,6 +18,8 @@ public:
 
     bool wants(std::uint32_t code) const { return subscription.wants(code); }
     void handleNews();
+    /// There will be no more: a channel that has ended may go only after all others.
+    void detach() { feed = nullptr; }
 
 private:
     using Clock = std::chrono::steady_clock;
@@ -28,7 +30,7 @@ private:
 
     void arm();
 
-    ModemFeed& feed;
+    ModemFeed* feed;
     Subscription subscription;
     std::function<void()> more;
     std::array<Sent, ModemFeed::kCodes.size()> sent;

@@ -63,8 +63,9 @@ void SystemBus::takeConnection()
         return;
     }
     connection = made;
-    disconnected = subscribe({}, QStringLiteral("/org/freedesktop/DBus/Local"),
-                             QStringLiteral("org.freedesktop.DBus.Local"), QStringLiteral("Disconnected"),
+    disconnected = subscribe({.path = QStringLiteral("/org/freedesktop/DBus/Local"),
+                              .interface = QStringLiteral("org.freedesktop.DBus.Local"),
+                              .signal = QStringLiteral("Disconnected")},
                              [this](const QDBusMessage&) {
                                  // Not inside the call of what it takes away.
                                  QTimer::singleShot(0, context.get(), [this] { lose("it went away"); });
@@ -100,13 +101,12 @@ void SystemBus::call(const MethodCall& call, std::chrono::milliseconds timeout, 
                      });
 }
 
-std::unique_ptr<SignalRelay> SystemBus::subscribe(const QString& service, const QString& path,
-                                                  const QString& interface, const QString& signal,
-                                                  SignalRelay::Callback callback)
+std::unique_ptr<SignalRelay> SystemBus::subscribe(const Subscription& wanted, SignalRelay::Callback callback)
 {
     auto relay = std::make_unique<SignalRelay>(std::move(callback));
     if (connection)
-        connection->connect(service, path, interface, signal, relay.get(), SLOT(relay(QDBusMessage)));
+        connection->connect(wanted.service, wanted.path, wanted.interface, wanted.signal,
+                            wanted.firstArguments, {}, relay.get(), SLOT(relay(QDBusMessage)));
     return relay;
 }
 

@@ -39,10 +39,14 @@ public:
     /// A reply comes once, in the form of an error after the time; not at all when the bus was lost
     /// meanwhile.
     void call(const MethodCall& call, std::chrono::milliseconds timeout, Reply reply);
-    /// Of any sender: who must be sure looks at the message.
-    std::unique_ptr<SignalRelay> subscribe(const QString& service, const QString& path,
-                                           const QString& interface, const QString& signal,
-                                           SignalRelay::Callback callback);
+    struct Subscription {
+        QString service = {}; // empty for any: who must be sure looks at the message
+        QString path = {};    // empty for any
+        QString interface;
+        QString signal;
+        QStringList firstArguments = {};
+    };
+    std::unique_ptr<SignalRelay> subscribe(const Subscription& wanted, SignalRelay::Callback callback);
 
 private:
     void connect();
