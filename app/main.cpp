@@ -2,6 +2,7 @@
 #include "app/ColourScheme.h"
 #include "app/Display.h"
 #include "app/PelorusApp.h"
+#include "app/StartAlert.h"
 #include "platform/Console.h"
 #include "platform/linux/LinuxPlatform.h"
 #include "platform/linux/PortDirectory.h"
@@ -73,6 +74,7 @@ int main(int argc, char** argv)
     std::string why;
     if (!PortDirectory::open(why)) {
         fmt::print(stderr, "pelorus: {}\n", why);
+        showStartAlert(why);
         return 1;
     }
     SyslogSink log("pelorus");

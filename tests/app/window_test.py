@@ -214,12 +214,33 @@ class WithoutDisplay(Scratch):
         self.assertEqual(len(result.stderr.splitlines()), 1, result.stderr)
         self.assertIn('DISPLAY is ":4711"', result.stderr)
 
-    def test_refuses_a_port_directory_of_others(self):
+
+class WithAPortDirectoryOfOthers(Window):
+    def setUp(self):
+        super().setUp()
         os.chmod(self.directory, stat.S_IRWXU | stat.S_IWGRP | stat.S_IWOTH)
-        result = self.run_pelorus(DISPLAY=os.environ["DISPLAY"])
-        self.assertEqual(result.returncode, 1)
-        self.assertIn(self.directory, result.stderr)
-        self.assertEqual(len(result.stderr.splitlines()), 1, result.stderr)
+
+    def ended(self, status, _, errors):
+        self.assertEqual(status, 1)
+        self.assertEqual(errors, f"pelorus: port directory {self.directory}: other users can write to it (mode 0722)\n")
+
+    def test_tells_on_the_screen_why_it_does_not_start(self):
+        monitor = self.open()
+        wait_for("the reason", lambda: any(self.directory in label for label in monitor.labels()))
+        self.picture("refused")
+        self.assertIsNone(monitor.process.poll())
+        monitor.keys("Escape")
+        self.ended(*monitor.wait())
+
+    def test_ends_by_a_signal(self):
+        monitor = self.open()
+        wait_for("the reason", lambda: any(self.directory in label for label in monitor.labels()))
+        self.ended(*monitor.end())
+
+    def test_waits_for_nobody_without_a_screen(self):
+        result = subprocess.run([PELORUS, "-platform", "offscreen"], capture_output=True, text=True, timeout=20, check=False,
+                                env=dict(os.environ, PELORUS_PORT_DIRECTORY=self.directory))
+        self.ended(result.returncode, result.stdout, result.stderr)
 
 
 if __name__ == "__main__":
