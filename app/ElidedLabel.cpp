@@ -1,5 +1,7 @@
 #include "app/ElidedLabel.h"
 
+#include "app/OneLine.h"
+
 #include <QPainter>
 #include <QStyle>
 
@@ -18,9 +20,8 @@ QSize ElidedLabel::minimumSizeHint() const
 void ElidedLabel::paintEvent(QPaintEvent*)
 {
     QPainter painter(this);
-    const QString line = QString(text()).replace(u'\n', u' ');
     style()->drawItemText(&painter, contentsRect(), static_cast<int>(alignment()), palette(), isEnabled(),
-                          fontMetrics().elidedText(line, Qt::ElideRight, contentsRect().width()),
+                          fontMetrics().elidedText(onOneLine(text()), Qt::ElideRight, contentsRect().width()),
                           foregroundRole());
 }
 

@@ -102,7 +102,10 @@ void NavigationController::slide(PelorusPaneController* from, PelorusPaneControl
     to->setGeometry(room->rect());
     to->show();
     (way == Way::in ? to : from)->raise();
-    to->setFocus(Qt::OtherFocusReason);
+    // A pane that goes away by itself takes the keys from nobody who types somewhere else.
+    const QWidget* focus = window()->focusWidget();
+    if (isVisible() && (!focus || isAncestorOf(focus)))
+        to->setFocus(Qt::OtherFocusReason);
     ++slides;
     const auto move = [this, from = QPointer(from), to = QPointer(to), way](double share) {
         // The one above goes all the way, the one below a third of it.
@@ -153,7 +156,7 @@ void NavigationController::mousePressEvent(QMouseEvent* event)
 void NavigationController::showBars()
 {
     title->setTitle(topViewController()->title());
-    title->setBackTitle(stack.size() > 1 ? stack[stack.size() - 2]->title() : QString());
+    title->setBackTitle(stack.size() > 1 ? std::optional(stack[stack.size() - 2]->title()) : std::nullopt);
     tools->setItems(topViewController()->toolbarItems());
     window()->setWindowTitle(topViewController()->title());
 }

@@ -12,11 +12,23 @@ namespace {
 constexpr double kRightMargin = 10;    // as wide as the one that the layout leaves on the left
 constexpr double kReadableWidth = 720; // names and values farther apart are hard to read together
 constexpr double kChevronHeight = 11;
+constexpr double kChevronRoom = 24;
 constexpr double kFade = 28;
 
 QRectF toQt(const Rect& rect)
 {
     return {rect.x, rect.y, rect.width, rect.height};
+}
+
+/// Where a text goes on: into the background, which is all there is at `to`.
+void paintFade(QPainter& painter, const QColor& background, double from, double to)
+{
+    QLinearGradient gradient(from, 0, to, 0);
+    QColor clear = background;
+    clear.setAlpha(0);
+    gradient.setColorAt(0, clear);
+    gradient.setColorAt(1, background);
+    painter.fillRect(QRectF(std::min(from, to), 0, kFade, kStripHeight - 1), gradient);
 }
 
 } // namespace
@@ -146,10 +158,21 @@ void PelorusCell::paintEvent(QPaintEvent*)
     if (view)
         paintStrip(painter, background);
     else
-        keyLabel.paint(painter);
+        paintName(painter, background);
     if (accessoryType == Accessory::disclosureIndicator)
         paintChevron(painter, {content.width() - 10, (height() - kChevronHeight) / 2, 10, kChevronHeight},
                      ChevronDirection::right, blend(background, text, highlighted ? 0.9 : 0.4));
+}
+
+void PelorusCell::paintName(QPainter& painter, const QColor& background) const
+{
+    const double right = contentFrame().width() - kChevronRoom;
+    painter.save();
+    painter.setClipRect(QRectF(0, 0, right, height() - 1));
+    keyLabel.paint(painter);
+    if (keyLabel.frame.right() > right)
+        paintFade(painter, background, right - kFade, right);
+    painter.restore();
 }
 
 void PelorusCell::paintStrip(QPainter& painter, const QColor& background) const
@@ -160,19 +183,11 @@ void PelorusCell::paintStrip(QPainter& painter, const QColor& background) const
     keyLabel.paint(painter);
     valueLabel->paint(painter);
     painter.translate(view->offset, 0);
-    const auto fade = [&](double from, double to) { // there is more on that side
-        QLinearGradient gradient(from, 0, to, 0);
-        QColor clear = background;
-        clear.setAlpha(0);
-        gradient.setColorAt(0, clear);
-        gradient.setColorAt(1, background);
-        painter.fillRect(QRectF(std::min(from, to), 0, kFade, height() - 1), gradient);
-    };
     const double right = view->frame.right();
     if (valueLabel->frame.right() - view->offset > right)
-        fade(right - kFade, right);
+        paintFade(painter, background, right - kFade, right);
     if (view->offset > 0)
-        fade(view->frame.left() + kFade, view->frame.left());
+        paintFade(painter, background, view->frame.left() + kFade, view->frame.left());
     painter.restore();
 }
 

@@ -55,6 +55,7 @@ private:
     PelorusCell(QString reuseIdentifier, bool leaf, QWidget* parent);
     Rect bounds() const;
     void layOut();
+    void paintName(QPainter& painter, const QColor& background) const;
     void paintStrip(QPainter& painter, const QColor& background) const;
 
     QString identifier;

@@ -1,5 +1,7 @@
 #include "app/TextLabel.h"
 
+#include "app/OneLine.h"
+
 #include <QFontMetricsF>
 #include <QGuiApplication>
 
@@ -10,7 +12,8 @@ bool TextLabel::setText(const QString& text)
     if (string == text)
         return false;
     string = text;
-    const QSizeF size = QFontMetricsF(labelFont).size(Qt::TextSingleLine, string);
+    line = onOneLine(text);
+    const QSizeF size = QFontMetricsF(labelFont).size(Qt::TextSingleLine, line);
     extent = {size.width(), size.height()};
     return true;
 }
@@ -18,7 +21,7 @@ bool TextLabel::setText(const QString& text)
 void TextLabel::paint(QPainter& painter) const
 {
     painter.setFont(labelFont);
-    painter.drawText(frame, Qt::TextSingleLine | Qt::TextDontClip | Qt::AlignLeft | Qt::AlignVCenter, string);
+    painter.drawText(frame, Qt::TextSingleLine | Qt::TextDontClip | Qt::AlignLeft | Qt::AlignVCenter, line);
 }
 
 QFont systemFont(int size, QFont::Weight weight)

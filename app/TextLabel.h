@@ -26,6 +26,7 @@ public:
 private:
     QFont labelFont;
     QString string;
+    QString line; // what is painted
     Size extent;
 };
 

@@ -2,6 +2,7 @@
 
 #include "app/Chevron.h"
 #include "app/ElidedLabel.h"
+#include "app/OneLine.h"
 #include "app/TextLabel.h"
 
 #include <QEvent>
@@ -49,14 +50,14 @@ QString TitleBar::title() const
     return label->text();
 }
 
-void TitleBar::setBackTitle(const QString& title)
+void TitleBar::setBackTitle(const std::optional<QString>& title)
 {
-    button->setVisible(!title.isEmpty());
+    button->setVisible(title.has_value());
     if (backTitle == title)
         return;
     backTitle = title;
-    button->setAccessibleName(title.isEmpty() ? QString() : tr("Back to %1").arg(title));
-    button->setToolTip(button->accessibleName());
+    button->setAccessibleName(title ? tr("Back to %1").arg(*title) : QString());
+    button->setToolTip(asPlainToolTip(button->accessibleName()));
     arrange();
 }
 
@@ -72,9 +73,13 @@ void TitleBar::arrange()
     const int ofArrow = kArrowSize + 20;
     const int titleWidth = std::min(label->sizeHint().width(), width() - 2 * (ofArrow + 2 * kSpace));
     const int room = (width() - titleWidth) / 2 - 2 * kSpace;
-    const int needed = button->fontMetrics().horizontalAdvance(backTitle);
+    const QString name = onOneLine(backTitle.value_or(QString()));
+    const int needed = button->fontMetrics().horizontalAdvance(name);
     const bool named = room - ofArrow >= std::min(needed, kShortestName);
-    button->setText(button->fontMetrics().elidedText(backTitle, Qt::ElideRight, room - ofArrow));
+    // An ampersand is part of the name, not the mark of a key.
+    button->setText(button->fontMetrics()
+                        .elidedText(name, Qt::ElideRight, room - ofArrow)
+                        .replace(QStringLiteral("&"), QStringLiteral("&&")));
     button->setToolButtonStyle(named ? Qt::ToolButtonTextBesideIcon : Qt::ToolButtonIconOnly);
     button->resize(named ? std::min(button->sizeHint().width(), room) : ofArrow, button->height());
     button->move(kSpace, kSpace);

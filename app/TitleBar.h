@@ -2,6 +2,7 @@
 
 #include <QWidget>
 #include <functional>
+#include <optional>
 
 class QToolButton;
 
@@ -14,8 +15,8 @@ class TitleBar : public QWidget {
 public:
     TitleBar(std::function<void()> back, QWidget* parent = nullptr);
     void setTitle(const QString& title);
-    /// What the way back leads to; empty where there is none.
-    void setBackTitle(const QString& title);
+    /// What the way back leads to; nothing where there is none.
+    void setBackTitle(const std::optional<QString>& title);
     QToolButton& backButton() { return *button; }
     QString title() const;
 
@@ -30,7 +31,7 @@ private:
 
     QToolButton* button;
     ElidedLabel* label;
-    QString backTitle;
+    std::optional<QString> backTitle;
 };
 
 } // namespace pelorus

@@ -54,7 +54,9 @@ void Toolbar::setNotice(const QString& text)
 
 void Toolbar::showText()
 {
-    const QString& text = notice.isEmpty() ? status : notice;
+    QString text = status;
+    if (!notice.isEmpty())
+        text = wheel->isRunning() ? status + QStringLiteral("  ") + notice : notice;
     if (label->text() == text)
         return;
     label->setText(text);

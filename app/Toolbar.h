@@ -17,7 +17,7 @@ class Toolbar : public QWidget {
 public:
     Toolbar(std::function<void()> save, QWidget* parent = nullptr);
     void setItems(const ToolbarItems& items);
-    /// Stands in for the status until it is empty again.
+    /// Stands in for the status until it is empty again; beside it while the indicator runs.
     void setNotice(const QString& text);
     ActivityIndicator& indicator() { return *wheel; }
     QToolButton& saveButton() { return *button; }

@@ -30,7 +30,8 @@ PaneRows::PaneRows(std::shared_ptr<const PelorusModelNode> shown) : node(std::mo
     for (const auto& child : *children) {
         std::string identity = child->displayName();
         if (places.contains(identity))
-            identity = fmt::format("{}\n{}", identity, ++repeated[child->displayName()]);
+            identity =
+                fmt::format("{}{}{}", identity, '\0', ++repeated[child->displayName()]); // as no name is
         places.emplace(identity, count());
         identities.push_back(std::move(identity));
     }

@@ -54,6 +54,36 @@ TEST_F(Navigation, TheWayBackIsAnArrowWhereThereIsNoRoomForItsName)
     EXPECT_LT(titleBar().backButton().geometry().right(), 48);
 }
 
+TEST_F(Navigation, TheWayBackShowsAnyNameAsItIs)
+{
+    const auto backFrom = [this](const std::string& name) -> QToolButton& {
+        const auto inner = makeDictionary({{"In", cell("7", "3")}, {"B", "1"}});
+        receive(makeDictionary({{name, inner}, {"B", "1"}}));
+        click(0);
+        click(0);
+        EXPECT_EQ(titleBar().title(), "In");
+        return titleBar().backButton();
+    };
+    const QToolButton& button = backFrom("A && B &C");
+    EXPECT_EQ(button.text(), "A &&&& B &&C") << "none of them marks a key";
+    EXPECT_TRUE(button.shortcut().isEmpty());
+    receive(makeDictionary({{"B", "1"}, {"C", "1"}}));
+    EXPECT_EQ(backFrom("A\nB").text(), "A B");
+    receive(makeDictionary({{"B", "1"}, {"C", "1"}}));
+    EXPECT_EQ(backFrom("<b>A</b>").text(), "<b>A</b>");
+    EXPECT_TRUE(button.toolTip().contains("&lt;b&gt;A&lt;/b&gt;"));
+}
+
+TEST_F(Navigation, ThereIsAWayBackToASectionWithoutAName)
+{
+    const auto inner = makeDictionary({{"In", cell("7", "3")}, {"B", "1"}});
+    receive(makeDictionary({{"", inner}, {"B", "1"}}));
+    click(0);
+    click(0);
+    EXPECT_EQ(titleBar().title(), "In");
+    EXPECT_TRUE(titleBar().backButton().isVisible());
+}
+
 TEST_F(Navigation, TheToolbarShowsIndicatorStatusAndSaveFromTheLeft)
 {
     EXPECT_FALSE(toolbar().indicator().isVisible());

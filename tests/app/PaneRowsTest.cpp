@@ -36,6 +36,15 @@ TEST(PaneRows, OfTheSameNameAreToldApart)
         EXPECT_EQ(rows.find(rows.identityOf(row)), row);
 }
 
+TEST(PaneRows, OfTheSameNameAreToldApartFromNamesLikeTheirs)
+{
+    const PaneRows rows(
+        treeOf(makeDictionary({{"_sorted", "1"}, {"01;Band", "3"}, {"02;Band\n1", "7"}, {"03;Band", "20"}})));
+    ASSERT_EQ(rows.count(), 3);
+    for (int row = 0; row < 3; ++row)
+        EXPECT_EQ(rows.find(rows.identityOf(row)), row);
+}
+
 TEST(PaneRows, AreCopiedAsTextWithAllThatIsBelow)
 {
     const PaneRows rows(treeOf(makeDictionary(

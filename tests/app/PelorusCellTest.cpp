@@ -92,6 +92,30 @@ TEST_F(Cell, MeasuresTextsWithLineFeedsAsOneLine)
     EXPECT_EQ(cell->value()->frame.height(), regular("one two").height());
 }
 
+TEST_F(Cell, MeasuresTextsWithAnyOtherLineBreakAsOneLine)
+{
+    const auto cell = leaf("Name", QStringLiteral("one\u2028two"), 320);
+    EXPECT_EQ(cell->value()->frame.size(), regular("one two"));
+    EXPECT_EQ(cell->value()->text(), QStringLiteral("one\u2028two")) << "which is what is copied";
+}
+
+TEST_F(Cell, AnInnerNodesLongNameEndsBeforeItsArrow)
+{
+    const std::unique_ptr<PelorusCell> cell(PelorusCell::initWithStyleKey("id", nullptr));
+    cell->resize(330, 50);
+    cell->setAccessory(PelorusCell::Accessory::disclosureIndicator);
+    const auto pictureOf = [&](const QString& name) {
+        cell->setKey(name);
+        cell->setLayoutKey();
+        return cell->grab().toImage();
+    };
+    const QRect arrow(300, 0, 30, 49);
+    const QImage shortName = pictureOf("M");
+    const QImage longName = pictureOf(QString(200, u'M'));
+    EXPECT_EQ(longName.copy(arrow), shortName.copy(arrow));
+    EXPECT_NE(longName.copy(0, 0, 200, 49), shortName.copy(0, 0, 200, 49));
+}
+
 TEST_F(Cell, KeepsNameAndValueTogetherInAWideWindow)
 {
     const auto cell = leaf("Band", "3", 1990);

@@ -100,6 +100,20 @@ TEST_F(SaveView, NamesTheFileInTheStatusLineForAWhile)
     EXPECT_EQ(notice(), "Updated 2024-05-01 at 13:45:07");
 }
 
+TEST_F(SaveView, NamesTheFileBesideTheStatusWhileThereIsNoConnection)
+{
+    receive(makeDictionary({{"A", "1"}, {"B", "1"}}));
+    app.showSaveView();
+    pressSave();
+    platform.runMainQueue();
+    loseServer();
+    EXPECT_EQ(notice(), "Connecting...  Saved PelorusSnapshot-1714563907.pelorus");
+    platform.advance(4s);
+    EXPECT_EQ(notice(), "Connecting...  Saved PelorusSnapshot-1714563907.pelorus");
+    platform.advance(1s);
+    EXPECT_EQ(notice(), "Connecting...");
+}
+
 TEST_F(SaveView, TellsWhenTheFileCannotBeWrittenAndClosesAllTheSame)
 {
     platform.writesFail = true;
@@ -119,6 +133,22 @@ TEST_F(SaveView, TellsWhenTheFileCannotBeWrittenAndClosesAllTheSame)
     EXPECT_EQ(alert->buttons().front()->text(), "Close");
     QTest::mouseClick(alert->buttons().front(), Qt::LeftButton);
     EXPECT_EQ(notice(), "Connecting...");
+}
+
+TEST_F(SaveView, WhoeverDescribesIsNotInterruptedBySectionsThatVanish)
+{
+    receive(makeDictionary({{"LTE", cell("7", "3")}, {"B", "1"}}));
+    click(0);
+    ASSERT_EQ(depth(), 2u);
+    app.showSaveView();
+    QApplication::setActiveWindow(app.getWindow());
+    screen().saveDescription()->setFocus();
+    ASSERT_TRUE(screen().saveDescription()->hasFocus());
+    receive(makeDictionary({{"B", "1"}, {"C", "1"}}));
+    EXPECT_EQ(depth(), 1u);
+    EXPECT_TRUE(screen().saveDescription()->hasFocus());
+    app.closeSaveView();
+    EXPECT_TRUE(table().hasFocus());
 }
 
 TEST_F(SaveView, CancelWritesNothing)
