@@ -17,7 +17,9 @@ constexpr std::size_t kTrailerLength = 32; // unused 6, offset size, reference s
 /// to. A cycle of references ends at the depth limit. Allocates nothing.
 class BinaryPropertyListGuard {
 public:
-    BinaryPropertyListGuard(std::span<const std::byte> bytes, std::string& why) : bytes(bytes), why(why) {}
+    BinaryPropertyListGuard(std::span<const std::byte> bytes, std::string& why)
+        : bytes(bytes), why(why), budget(bytes.size())
+    {}
 
     bool admits() { return readTrailer() && walk(); }
 

@@ -17,7 +17,9 @@ struct PropertyListLimits {
     static constexpr std::size_t input = 256 * 1024 * 1024;
     static constexpr std::size_t depth = 256;      // containers within containers
     static constexpr std::size_t values = 250'000; // keys included, after shared references are expanded
-    static constexpr std::size_t bytes = 64 * 1024 * 1024; // of text and data, after expansion
+    /// Of text and data beyond the list's own length, after expansion: a snapshot's raw log may be as long as
+    /// the file, and only shared references can make more of it.
+    static constexpr std::size_t expansion = 64 * 1024 * 1024;
     /// Steps of the two things whose cost libplist lets grow with the square of a list's size, both in XML:
     /// the keys of one dictionary, some 18,000 of which are allowed, and the entities of one text, half a
     /// megabyte of which may be nothing else. Ten nanoseconds or so each.

@@ -17,8 +17,8 @@ bool PropertyListBudget::takeValue(std::string& why)
 bool PropertyListBudget::takeBytes(std::uint64_t count, std::string& why)
 {
     if (count > bytes) {
-        why = fmt::format("the property list holds more than {} bytes of text and data",
-                          PropertyListLimits::bytes);
+        why = fmt::format("the property list expands by more than {} bytes of text and data",
+                          PropertyListLimits::expansion);
         return false;
     }
     bytes -= count;

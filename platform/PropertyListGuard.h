@@ -19,6 +19,9 @@ namespace pelorus {
 /// What is left of PropertyListLimits while a list is walked.
 class PropertyListBudget {
 public:
+    /// For a list of so many bytes.
+    explicit PropertyListBudget(std::size_t length) : bytes(length + PropertyListLimits::expansion) {}
+
     /// False when the limit is passed; `why` then says which.
     bool takeValue(std::string& why);
     bool takeBytes(std::uint64_t count, std::string& why);
@@ -27,7 +30,7 @@ public:
 
 private:
     std::size_t values = PropertyListLimits::values;
-    std::uint64_t bytes = PropertyListLimits::bytes;
+    std::uint64_t bytes;
     std::uint64_t steps = PropertyListLimits::steps;
 };
 

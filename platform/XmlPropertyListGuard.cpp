@@ -15,7 +15,9 @@ using namespace std::literals;
 /// Stricter than XML: where libplist's own reading and XML differ, neither is taken but the text is refused.
 class XmlPropertyListGuard {
 public:
-    XmlPropertyListGuard(std::string_view text, std::string& why) : scanner(text), why(why) {}
+    XmlPropertyListGuard(std::string_view text, std::string& why)
+        : scanner(text), why(why), budget(text.size())
+    {}
 
     std::optional<std::string_view> rootElement();
 

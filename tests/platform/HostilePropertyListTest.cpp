@@ -114,10 +114,18 @@ TEST(HostilePropertyList, SharedReferencesThatExpand)
     BinaryListBuilder data;
     data.referenceSize = 2;
     data.array(std::vector<std::uint64_t>(10'000, 1)).string(std::string(10'000, 'x'));
-    EXPECT_EQ(refusal(data.bytes()), "the property list holds more than 67108864 bytes of text and data");
+    EXPECT_EQ(refusal(data.bytes()),
+              "the property list expands by more than 67108864 bytes of text and data");
     BinaryListBuilder keys;
     keys.array(std::vector<std::uint64_t>(20'000, 1)).dictionary({2}, {3}).string(std::string(10'000, 'x'));
     EXPECT_NE(refusal(keys.object("\x09").bytes()), "");
+}
+
+TEST(HostilePropertyList, ALongRawLogIsNoExpansion)
+{
+    const Value log = makeData(std::vector<std::byte>(70 * 1024 * 1024, std::byte{0x5A}));
+    for (const PropertyListForm form : {PropertyListForm::xml, PropertyListForm::binary})
+        EXPECT_TRUE(parsePropertyList(serializePropertyList(log, form).value()) == log);
 }
 
 TEST(HostilePropertyList, ValuesToTheLimit)
