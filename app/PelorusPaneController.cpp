@@ -81,7 +81,7 @@ void PelorusPaneController::showTitle()
         navigationController->titleChanged(*this);
 }
 
-PelorusCell& PelorusPaneController::cellForRow(TableView& view, int row, const QSize& size)
+PelorusCell& PelorusPaneController::cellForRowAtIndexPath(TableView& view, int row, const QSize& size)
 {
     const PelorusModelNode& child = *rows.at(row);
     const bool leaf = !child.childNodes();
@@ -104,7 +104,7 @@ PelorusCell& PelorusPaneController::cellForRow(TableView& view, int row, const Q
     return *cell;
 }
 
-void PelorusPaneController::didSelectRow(int row)
+void PelorusPaneController::didSelectRowAtIndexPath(int row)
 {
     const auto& child = rows.at(row);
     if (!child->childNodes()) {

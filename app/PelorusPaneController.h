@@ -30,9 +30,9 @@ public:
     /// What the Save button does.
     void savePressed() { host.showSaveView(); }
 
-    int numberOfRows() const override { return rows.count(); }
-    PelorusCell& cellForRow(TableView& table, int row, const QSize& size) override;
-    void didSelectRow(int row) override;
+    int numberOfRowsInSection() const override { return rows.count(); }
+    PelorusCell& cellForRowAtIndexPath(TableView& table, int row, const QSize& size) override;
+    void didSelectRowAtIndexPath(int row) override;
 
 protected:
     void keyPressEvent(QKeyEvent* event) override;

@@ -48,7 +48,7 @@ void PelorusSaveViewController::viewDidLoad()
 {
     connect(interface->saveButton, &QPushButton::clicked, this, [this] { savePressed(); });
     connect(interface->cancelButton, &QPushButton::clicked, this, [this] { cancelPressed(); });
-    connect(saveDescription(), &QLineEdit::returnPressed, this, [this] { saveDescription()->clearFocus(); });
+    connect(saveDescription(), &QLineEdit::returnPressed, this, [this] { textFieldShouldReturn(); });
     connect(new QShortcut(QKeySequence::Save, this), &QShortcut::activated, this, [this] { savePressed(); });
     connect(new QShortcut(QKeySequence::Cancel, this), &QShortcut::activated, this,
             [this] { cancelPressed(); });
@@ -70,7 +70,7 @@ void PelorusSaveViewController::viewDidLoad()
         item->setCheckState(Qt::Checked);
     }
     // Rows are not acted on, but whoever taps one is done with the description.
-    connect(table, &QListWidget::itemPressed, this, [this] { saveDescription()->clearFocus(); });
+    connect(table, &QListWidget::itemPressed, this, [this] { didSelectRowAtIndexPath(); });
     table->setSizeAdjustPolicy(QAbstractScrollArea::AdjustToContents);
     table->setVisible(table->count() > 0);
     interface->contentLabel->setText(table->count() > 0 ? tr("What is saved")
@@ -98,6 +98,17 @@ void PelorusSaveViewController::savePressed()
 void PelorusSaveViewController::cancelPressed()
 {
     platform.dispatchAsyncOnMain([app = &host] { app->closeSaveView(); });
+}
+
+bool PelorusSaveViewController::textFieldShouldReturn()
+{
+    saveDescription()->clearFocus();
+    return true;
+}
+
+void PelorusSaveViewController::didSelectRowAtIndexPath()
+{
+    saveDescription()->clearFocus();
 }
 
 void PelorusSaveViewController::backgroundTouched()

@@ -27,6 +27,9 @@ public:
 
     void savePressed();
     void cancelPressed();
+    /// Return only closes the keyboard.
+    bool textFieldShouldReturn();
+    void didSelectRowAtIndexPath();
     void backgroundTouched();
 
 protected:

@@ -33,7 +33,7 @@ void TableView::reloadData()
     const std::vector<Shown> before = std::exchange(shown, {});
     const int topBefore = top();
     reusable.insert(reusable.end(), before.begin(), before.end());
-    rows = source.numberOfRows();
+    rows = source.numberOfRowsInSection();
 
     const auto find = [this](const std::string& identity) { return source.rowWithIdentity(identity); };
     std::erase_if(offsets, [&](const auto& offset) { return !find(offset.first); });
@@ -106,7 +106,7 @@ void TableView::show(int row)
 {
     rowInWork = source.identityOfRow(row);
     const QRect rect = rectOfRow(row);
-    PelorusCell& cell = source.cellForRow(*this, row, rect.size());
+    PelorusCell& cell = source.cellForRowAtIndexPath(*this, row, rect.size());
     const auto offset = offsets.find(rowInWork);
     cell.setOffset(offset == offsets.end() ? 0 : offset->second);
     cell.setHighlighted(highlighted && current == row);
@@ -161,7 +161,7 @@ void TableView::scrollToRow(int row)
 void TableView::activateRow(int row)
 {
     setCurrentRow(row);
-    source.didSelectRow(row);
+    source.didSelectRowAtIndexPath(row);
 }
 
 void TableView::openMenu(int row, const QPoint& globalPosition)

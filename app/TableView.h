@@ -20,16 +20,16 @@ class TableView;
 class TableSource {
 public:
     virtual ~TableSource() = default;
-    virtual int numberOfRows() const = 0;
+    virtual int numberOfRowsInSection() const = 0;
     /// A cell from the table's dequeueReusableCell(), or a new one that is a child of the table's viewport,
     /// with texts and layout.
-    virtual PelorusCell& cellForRow(TableView& table, int row, const QSize& size) = 0;
+    virtual PelorusCell& cellForRowAtIndexPath(TableView& table, int row, const QSize& size) = 0;
     /// By what a row is found again when others come and go around it.
     virtual const std::string& identityOfRow(int row) const = 0;
     virtual std::optional<int> rowWithIdentity(const std::string& identity) const = 0;
     virtual QString nameOfRow(int row) const = 0;
     virtual QString valueOfRow(int row) const = 0;
-    virtual void didSelectRow(int row) = 0;
+    virtual void didSelectRowAtIndexPath(int row) = 0;
     virtual void showMenuForRow(int row, const QPoint& globalPosition) = 0;
 };
 

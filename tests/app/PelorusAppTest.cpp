@@ -17,7 +17,7 @@ TEST_F(AppFixture, BeforeTheWindowIsShownTheRootPaneSaysConnectingWithoutDots)
     PelorusPaneController root(nullptr, "/", host);
     EXPECT_EQ(root.path(), "/");
     EXPECT_EQ(root.title(), "Pelorus");
-    EXPECT_EQ(root.numberOfRows(), 0);
+    EXPECT_EQ(root.numberOfRowsInSection(), 0);
     EXPECT_EQ(root.toolbarItems(), (ToolbarItems{true, "", false}));
     root.setStatus("Connecting", true);
     EXPECT_EQ(root.toolbarItems(), (ToolbarItems{true, "Connecting", false}));
