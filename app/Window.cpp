@@ -2,6 +2,7 @@
 
 #include "app/Motion.h"
 
+#include <QScreen>
 #include <QSettings>
 
 namespace pelorus {
@@ -17,7 +18,7 @@ const QString kGeometry = QStringLiteral("WindowGeometry");
 Window::Window()
 {
     setMinimumSize(kSmallest);
-    resize(kFirst);
+    resize(kFirst.boundedTo(screen()->availableSize())); // or the toolbar may be below the screen
 }
 
 void Window::setRootView(QWidget& view)

@@ -152,6 +152,11 @@ class Monitor:
         self.keys("Home", *["Down"] * index, "Return")
         wait_for("the pane " + title, lambda: self.title() == title)
 
+    def size(self):
+        lines = tool("xdotool", "getwindowgeometry", "--shell", self.window).split()
+        geometry = dict(line.split("=") for line in lines)
+        return int(geometry["WIDTH"]), int(geometry["HEIGHT"])
+
     def picture(self, path):
         time.sleep(0.4)  # whatever slides has arrived
         tool("import", "-window", self.window, path)

@@ -177,6 +177,12 @@ class WithServerOfOurOwn(Window):
             self.assertEqual(plistlib.load(file)["Description"],
                              "Recovered after LogCode_0xFF0000::UnknownDataException")
 
+    def test_fits_on_a_screen_that_is_small_for_its_density(self):
+        os.environ["QT_SCALE_FACTOR"] = "1.5"
+        self.addCleanup(os.environ.pop, "QT_SCALE_FACTOR")
+        monitor, _ = self.connect()
+        self.assertEqual(monitor.size(), (720, 900))
+
     def test_its_end_tells_the_home_screen_and_leaves_nothing(self):
         monitor, _ = self.connect()
         listener = subprocess.Popen(["dbus-monitor", "--session", "interface='io.pelorus.HomeScreen'"],
