@@ -15,8 +15,9 @@ namespace pelorus {
 
 namespace {
 
-/// `like` is a dictionary whose keys may be the same again, as in lists of records; they are shared then.
-Value valueOf(plist_t node, const Dictionary* like = nullptr);
+/// Reads a node into `out`, which is nil. False when the node is nothing that a property list holds. The keys
+/// of `like`, if given, may be the same again, as in lists of records; they are shared then.
+bool read(plist_t node, Value& out, const Value* like = nullptr);
 
 /// libplist hands a date out in 32-bit seconds and cuts the microseconds off. What those two cannot tell
 /// comes from the date's binary form.
@@ -49,24 +50,21 @@ Value dataOf(plist_t node)
     return makeData(bytes ? std::vector<std::byte>(bytes, bytes + length) : std::vector<std::byte>());
 }
 
-Value arrayOf(plist_t node)
+bool readArray(plist_t node, Value& out)
 {
-    auto array = makeArray();
-    array->elements.reserve(plist_array_get_size(node));
+    out = makeArray();
+    auto& elements = out.array()->elements;
+    elements.reserve(plist_array_get_size(node));
     plist_array_iter iterator = nullptr;
     plist_array_new_iter(node, &iterator);
     const PlistIterator owner(iterator);
-    const Dictionary* previous = nullptr;
     plist_t item = nullptr;
     for (plist_array_next_item(node, iterator, &item); item; plist_array_next_item(node, iterator, &item)) {
-        Value element = valueOf(item, previous);
-        if (!element)
-            return {};
-        if (const Dictionary* dictionary = element.dictionary())
-            previous = dictionary;
-        array->elements.push_back(std::move(element));
+        Value& element = elements.emplace_back();
+        if (!read(item, element, elements.size() > 1 ? &element - 1 : nullptr))
+            return false;
     }
-    return array;
+    return true;
 }
 
 /// The entries' positions, sorted by key and equal keys by position.
@@ -120,7 +118,7 @@ bool mayRepeatKeys(const Dictionary& dictionary)
     return false;
 }
 
-Value dictionaryOf(plist_t node, const Dictionary* like)
+bool readDictionary(plist_t node, Value& out, const Dictionary* like)
 {
     auto dictionary = makeDictionary();
     dictionary->reserve(plist_dict_get_size(node));
@@ -135,54 +133,62 @@ Value dictionaryOf(plist_t node, const Dictionary* like)
     for (plist_dict_next_item(node, iterator, &text, &item); text && item;
          plist_dict_next_item(node, iterator, &text, &item)) {
         const PlistText keyOwner(text);
-        Value value = valueOf(item);
-        if (!value)
-            return {};
         const std::size_t place = dictionary->size();
         sameKeys = sameKeys && place < likeEntries.size() && likeEntries[place].key == text;
-        dictionary->append(sameKeys ? likeEntries[place].key : Key(text), std::move(value));
+        const Dictionary::Entry* const other = sameKeys ? &likeEntries[place] : nullptr;
+        if (!read(item, dictionary->append(other ? other->key : Key(text)), other ? &other->value : nullptr))
+            return false;
     }
     // Keys that are all those of another dictionary are known to differ.
     if (!sameKeys && mayRepeatKeys(*dictionary))
-        return withoutRepeatedKeys(std::move(dictionary));
-    return dictionary;
+        dictionary = withoutRepeatedKeys(std::move(dictionary));
+    out = std::move(dictionary);
+    return true;
 }
 
-Value valueOf(plist_t node, const Dictionary* like)
+bool read(plist_t node, Value& out, const Value* like)
 {
     std::uint64_t number = 0;
     switch (plist_get_node_type(node)) {
     case PLIST_STRING: {
         const char* text = plist_get_string_ptr(node, &number);
-        return std::string(text, number);
+        out.text().assign(text, number);
+        break;
     }
     case PLIST_UINT:
         plist_get_uint_val(node, &number);
-        return static_cast<std::int64_t>(number);
+        out = static_cast<std::int64_t>(number);
+        break;
     case PLIST_UID:
         plist_get_uid_val(node, &number);
-        return static_cast<std::int64_t>(number);
+        out = static_cast<std::int64_t>(number);
+        break;
     case PLIST_REAL: {
         double real = 0;
         plist_get_real_val(node, &real);
-        return real;
+        out = real;
+        break;
     }
     case PLIST_BOOLEAN: {
         std::uint8_t truth = 0;
         plist_get_bool_val(node, &truth);
-        return truth != 0;
+        out = truth != 0;
+        break;
     }
     case PLIST_DATE:
-        return dateOf(node);
+        out = dateOf(node);
+        break;
     case PLIST_DATA:
-        return dataOf(node);
+        out = dataOf(node);
+        break;
     case PLIST_ARRAY:
-        return arrayOf(node);
+        return readArray(node, out);
     case PLIST_DICT:
-        return dictionaryOf(node, like);
+        return readDictionary(node, out, like ? like->dictionary() : nullptr);
     default:
-        return {};
+        return false;
     }
+    return static_cast<bool>(out);
 }
 
 PlistNode readBinary(std::span<const std::byte> bytes, std::string& why)
@@ -221,8 +227,8 @@ Value parse(std::span<const std::byte> bytes, std::string& why)
         bytes.size() >= magic.size() && std::memcmp(bytes.data(), magic.data(), magic.size()) == 0;
     const PlistNode root = isBinary ? readBinary(bytes, why) : readXml(bytes, why);
     Value value;
-    if (root)
-        value = valueOf(root.get());
+    if (root && !read(root.get(), value))
+        value = {};
     if (!value && why.empty())
         why = fmt::format("libplist cannot read the {} property list", isBinary ? "binary" : "XML");
     return value;

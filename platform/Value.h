@@ -188,6 +188,8 @@ public:
     }
     /// Adds an entry whose key is known to be absent.
     void append(Key key, Value value) { entries.push_back({std::move(key), std::move(value)}); }
+    /// Likewise; a nil to be filled at once.
+    Value& append(Key key) { return entries.emplace_back(Entry{std::move(key), {}}).value; }
     std::size_t size() const { return entries.size(); }
     bool empty() const { return entries.empty(); }
     auto begin() const { return entries.begin(); }

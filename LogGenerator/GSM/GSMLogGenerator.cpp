@@ -28,14 +28,16 @@ std::string_view className(const Value& object)
     return "Nil";
 }
 
-/// What stands below a key or in an array for that object.
-Value shownBelow(const Value& object)
+/// Makes `shown` what stands below a key or in an array for that object.
+void showBelow(const Value& object, Value& shown)
 {
-    if (object.string()) // nearly all are
-        return object;
-    Value shown = GSMLogGenerator::processObject(object);
-    Value only = GSMLogGenerator::canCollapse(shown);
-    return only ? only : shown;
+    if (const std::string* text = object.string()) { // nearly all are
+        shown.text().assign(*text);
+        return;
+    }
+    shown = GSMLogGenerator::processObject(object);
+    if (Value only = GSMLogGenerator::canCollapse(shown))
+        shown = std::move(only);
 }
 
 } // namespace
@@ -58,7 +60,7 @@ Value GSMLogGenerator::processObject(const Value& object)
         auto shown = makeDictionary();
         shown->reserve(dictionary->size());
         for (const auto& [key, value] : *dictionary)
-            shown->append(key, shownBelow(value));
+            showBelow(value, shown->append(key));
         return shown;
     }
     if (const Array* array = object.array()) {
@@ -66,7 +68,7 @@ Value GSMLogGenerator::processObject(const Value& object)
         shown->elements.reserve(array->elements.size());
         // The first element is never shown, whatever it is: meant.
         for (std::size_t index = 1; index < array->elements.size(); ++index)
-            shown->elements.push_back(shownBelow(array->elements[index]));
+            showBelow(array->elements[index], shown->elements.emplace_back());
         return shown;
     }
     throw InternalInconsistencyException(
