@@ -68,10 +68,27 @@ std::optional<Bytes> OSPLogGenerator::generateDlfFromState(const State& state) c
 
 void OSPLogGenerator::handOverRawMessages(State& state)
 {
-    const std::size_t usual = binData.size();
-    state.set(Label("DisplayState"), makeData(std::move(binData)));
-    binData = Bytes();
-    binData.reserve(usual);
+    const std::size_t size = binData.size();
+    auto messages = std::make_shared<Bytes>(std::move(binData));
+    state.set(Label("DisplayState"), Data(messages));
+    handedOver.push_back(std::move(messages));
+    binData = emptyBuffer(size);
+}
+
+// Fresh memory costs the kernel a tenth of what decoding the messages takes that are written there.
+Bytes OSPLogGenerator::emptyBuffer(std::size_t usualSize)
+{
+    Bytes buffer;
+    std::erase_if(handedOver, [&](const std::shared_ptr<Bytes>& messages) {
+        if (messages.use_count() > 1)
+            return false;
+        if (messages->capacity() <= 4 * usualSize && messages->capacity() > buffer.capacity())
+            buffer = std::move(*messages);
+        return true;
+    });
+    buffer.clear();
+    buffer.reserve(usualSize);
+    return buffer;
 }
 
 } // namespace pelorus

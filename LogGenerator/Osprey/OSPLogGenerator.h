@@ -25,6 +25,12 @@ protected:
     void handOverRawMessages(State& state);
 
     Bytes binData; // messages as received, one behind the other
+
+private:
+    /// An empty buffer, in memory that was handed over and that nobody holds any more, if there is such.
+    Bytes emptyBuffer(std::size_t usualSize);
+
+    std::vector<std::shared_ptr<Bytes>> handedOver; // those of the history, mostly
 };
 
 } // namespace pelorus

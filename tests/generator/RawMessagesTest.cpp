@@ -42,6 +42,26 @@ TEST_F(RawMessages, AreThoseSinceTheGenerationBefore)
     EXPECT_EQ(history[2].dictionary()->at("DisplayState"), Value(makeData({})));
 }
 
+TEST_F(RawMessages, StayAsTheyWereForWhoHoldsThem)
+{
+    constexpr unsigned kRounds = 12; // more than the history keeps, so that memory is used again
+    std::vector<Value> held;
+    for (unsigned round = 0; round < kRounds; ++round) {
+        receive(packet(1, 0x0100 + round));
+        generator.generateLogUsingState(state);
+        if (round % 2 == 0)
+            held.push_back(state.at("DisplayState"));
+    }
+    for (unsigned round = 0; round < kRounds; round += 2)
+        EXPECT_EQ(held[round / 2], Value(makeData(packet(1, 0x0100 + round).bytes()))) << round;
+    const auto& history = state.at("History").array()->elements;
+    ASSERT_EQ(history.size(), 5U);
+    for (unsigned entry = 0; entry < 5; ++entry)
+        EXPECT_EQ(history[entry].dictionary()->at("DisplayState"),
+                  Value(makeData(packet(1, 0x0100 + kRounds - 5 + entry).bytes())))
+            << entry;
+}
+
 TEST_F(RawMessages, IncludeTheOneThatEndsTheProgram)
 {
     index->first->throws = true;
