@@ -35,9 +35,11 @@ void showBelow(const Value& object, Value& shown)
         shown.text().assign(*text);
         return;
     }
-    shown = GSMLogGenerator::processObject(object);
-    if (Value only = GSMLogGenerator::canCollapse(shown))
-        shown = std::move(only);
+    // A group of one entry collapses to what becomes of the entry, so the group need not be made.
+    if (const Value only = GSMLogGenerator::canCollapse(object))
+        showBelow(only, shown);
+    else
+        shown = GSMLogGenerator::processObject(object);
 }
 
 } // namespace
