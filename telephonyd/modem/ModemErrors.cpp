@@ -30,7 +30,7 @@ const char* cure(const QString& what, const QString& error)
                      "(install with -DPELORUS_INSTALL_BUS_POLICY=ON, then: systemctl reload dbus)"
                    : "the bus policy does not allow it to this user";
     if (error == kModemErrors + QLatin1String("Unauthorized"))
-        return "polkit does not allow it to this session; run in the desktop session, or give the user a "
+        return "polkit does not allow it from here; run in the desktop session, or give the user a "
                "polkit rule as pelorus-telephonyd(1) shows";
     if (error == kModemErrors + QLatin1String("WrongState"))
         return "the modem is not enabled (mmcli -m any -e) or not on a network";

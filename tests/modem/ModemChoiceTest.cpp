@@ -136,7 +136,7 @@ TEST(ModemErrors, BusPolicyAndPolkitAreTwoThings)
         "-DPELORUS_INSTALL_BUS_POLICY=ON, then: systemctl reload dbus) "
         "(org.freedesktop.DBus.Error.AccessDenied: Rejected send message)");
     EXPECT_THAT(explainError("GetCellInfo", "org.freedesktop.ModemManager1.Error.Core.Unauthorized", "no"),
-                HasSubstr("polkit does not allow it to this session"));
+                HasSubstr("polkit does not allow it from here"));
     EXPECT_THAT(explainError("GetManagedObjects", "org.freedesktop.DBus.Error.ServiceUnknown", "not there"),
                 HasSubstr("ModemManager does not run"));
     EXPECT_THAT(explainError("GetLocation", "org.freedesktop.DBus.Error.NoReply", ""),
