@@ -1,11 +1,11 @@
 #include "platform/PropertyList.h"
 
+#include "platform/BinaryPropertyListReader.h"
 #include "platform/PlistNode.h"
 #include "platform/PropertyListGuard.h"
 
 #include <fmt/format.h>
 
-#include <algorithm>
 #include <bit>
 #include <cmath>
 #include <cstring>
@@ -67,57 +67,6 @@ bool readArray(plist_t node, Value& out)
     return true;
 }
 
-/// The entries' positions, sorted by key and equal keys by position.
-std::vector<std::size_t> sortedByKey(const Dictionary& dictionary)
-{
-    std::vector<std::size_t> order(dictionary.size());
-    for (std::size_t i = 0; i < order.size(); ++i)
-        order[i] = i;
-    const std::span entries(dictionary.begin(), dictionary.end());
-    std::sort(order.begin(), order.end(), [entries](std::size_t a, std::size_t b) {
-        const int difference = entries[a].key.text().compare(entries[b].key.text());
-        return difference != 0 ? difference < 0 : a < b;
-    });
-    return order;
-}
-
-/// Binary lists come out of libplist with repeated keys. Those keep the first one's place and the last one's
-/// value; nothing here takes quadratic time, whatever the number of keys.
-std::shared_ptr<Dictionary> withoutRepeatedKeys(std::shared_ptr<Dictionary> dictionary)
-{
-    const std::vector<std::size_t> order = sortedByKey(*dictionary);
-    const std::span entries(dictionary->begin(), dictionary->end());
-    constexpr std::size_t none = std::numeric_limits<std::size_t>::max();
-    std::vector<std::size_t> valueFrom(order.size(), none);
-    std::size_t count = 0;
-    for (std::size_t i = 0; i < order.size(); ++count) {
-        const std::size_t first = order[i];
-        std::size_t last = first;
-        for (; i < order.size() && entries[order[i]].key == entries[first].key; ++i)
-            last = order[i];
-        valueFrom[first] = last;
-    }
-    if (count == order.size())
-        return dictionary;
-    auto unique = makeDictionary();
-    unique->reserve(count);
-    for (std::size_t i = 0; i < valueFrom.size(); ++i)
-        if (valueFrom[i] != none)
-            unique->append(entries[i].key, entries[valueFrom[i]].value);
-    return unique;
-}
-
-bool mayRepeatKeys(const Dictionary& dictionary)
-{
-    if (dictionary.size() > 32)
-        return true;
-    for (auto entry = dictionary.begin(); entry != dictionary.end(); ++entry)
-        for (auto other = dictionary.begin(); other != entry; ++other)
-            if (entry->key == other->key)
-                return true;
-    return false;
-}
-
 bool readDictionary(plist_t node, Value& out, const Dictionary* like)
 {
     auto dictionary = makeDictionary();
@@ -139,9 +88,6 @@ bool readDictionary(plist_t node, Value& out, const Dictionary* like)
         if (!read(item, dictionary->append(other ? other->key : Key(text)), other ? &other->value : nullptr))
             return false;
     }
-    // Keys that are all those of another dictionary are known to differ.
-    if (!sameKeys && mayRepeatKeys(*dictionary))
-        dictionary = withoutRepeatedKeys(std::move(dictionary));
     out = std::move(dictionary);
     return true;
 }
@@ -191,24 +137,22 @@ bool read(plist_t node, Value& out, const Value* like)
     return static_cast<bool>(out);
 }
 
-PlistNode readBinary(std::span<const std::byte> bytes, std::string& why)
+Value readXml(std::span<const std::byte> bytes, std::string& why)
 {
-    plist_t node = nullptr;
-    if (admitsBinaryPropertyList(bytes, why))
-        plist_from_bin(reinterpret_cast<const char*>(bytes.data()), static_cast<std::uint32_t>(bytes.size()),
-                       &node);
-    return PlistNode(node);
-}
-
-PlistNode readXml(std::span<const std::byte> bytes, std::string& why)
-{
-    plist_t node = nullptr;
     const std::string_view text(reinterpret_cast<const char*>(bytes.data()), bytes.size());
-    if (const auto root = admitXmlPropertyList(text, why)) {
-        const XmlNumberLocale locale;
-        plist_from_xml(root->data(), static_cast<std::uint32_t>(root->size()), &node);
+    const auto element = admitXmlPropertyList(text, why);
+    if (!element)
+        return {};
+    plist_t node = nullptr;
+    const XmlNumberLocale locale;
+    plist_from_xml(element->data(), static_cast<std::uint32_t>(element->size()), &node);
+    const PlistNode root(node);
+    Value value;
+    if (!root || !read(root.get(), value)) {
+        why = "libplist cannot read the XML property list";
+        return {};
     }
-    return PlistNode(node);
+    return value;
 }
 
 Value parse(std::span<const std::byte> bytes, std::string& why)
@@ -225,13 +169,7 @@ Value parse(std::span<const std::byte> bytes, std::string& why)
     constexpr std::string_view magic = "bplist00";
     const bool isBinary =
         bytes.size() >= magic.size() && std::memcmp(bytes.data(), magic.data(), magic.size()) == 0;
-    const PlistNode root = isBinary ? readBinary(bytes, why) : readXml(bytes, why);
-    Value value;
-    if (root && !read(root.get(), value))
-        value = {};
-    if (!value && why.empty())
-        why = fmt::format("libplist cannot read the {} property list", isBinary ? "binary" : "XML");
-    return value;
+    return isBinary ? readBinaryPropertyList(bytes, why) : readXml(bytes, why);
 }
 
 } // namespace

@@ -4,13 +4,13 @@
 
 namespace pelorus {
 
-bool PropertyListBudget::takeValue(std::string& why)
+bool PropertyListBudget::takeValues(std::uint64_t count, std::string& why)
 {
-    if (values == 0) {
+    if (count > values) {
         why = fmt::format("the property list holds more than {} values", PropertyListLimits::values);
         return false;
     }
-    --values;
+    values -= count;
     return true;
 }
 

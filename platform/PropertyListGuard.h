@@ -6,15 +6,13 @@
 #include <cstddef>
 #include <cstdint>
 #include <optional>
-#include <span>
 #include <string>
 #include <string_view>
 
 namespace pelorus {
 
-// What stands in front of libplist 2.2.0, which recurses once for every container, expands a shared object
-// anew for every reference to it, and takes much that is malformed for something else. Nothing reaches
-// libplist that did not pass here.
+// What stands in front of libplist 2.2.0, which recurses once for every container and takes much that is
+// malformed for something else. Nothing reaches libplist that did not pass here.
 
 /// What is left of PropertyListLimits while a list is walked.
 class PropertyListBudget {
@@ -23,7 +21,7 @@ public:
     explicit PropertyListBudget(std::size_t length) : bytes(length + PropertyListLimits::expansion) {}
 
     /// False when the limit is passed; `why` then says which.
-    bool takeValue(std::string& why);
+    bool takeValues(std::uint64_t count, std::string& why);
     bool takeBytes(std::uint64_t count, std::string& why);
     bool takeSteps(std::uint64_t count, std::string& why);
     static bool allowsDepth(std::size_t containers, std::string& why);
@@ -39,9 +37,6 @@ constexpr Date kReferenceDate = std::chrono::sys_days{std::chrono::year{2001} / 
 /// The years 0 to 9999, counted so.
 constexpr std::chrono::seconds kEarliestDate{-63'145'526'400};
 constexpr std::chrono::seconds kLatestDate{252'423'993'599};
-
-/// Whether libplist may read the binary list; if not, `why` is one line.
-bool admitsBinaryPropertyList(std::span<const std::byte> bytes, std::string& why);
 
 /// The text of the root value's element, which is all that libplist needs to see of an XML list. Nothing,
 /// with one line in `why`, when libplist must not read it.

@@ -24,6 +24,39 @@ std::size_t characterLength(std::string_view text)
     return overlong || surrogate || beyond ? 0 : length;
 }
 
+constexpr char32_t kReplacement = 0xFFFD;
+
+bool isLeading(char32_t unit)
+{
+    return unit >= 0xD800 && unit < 0xDC00;
+}
+
+bool isTrailing(char32_t unit)
+{
+    return unit >= 0xDC00 && unit < 0xE000;
+}
+
+void append(std::string& out, char32_t character)
+{
+    const auto put = [&out](char32_t byte) { out += static_cast<char>(byte); };
+    const auto putRest = [&](unsigned shift) { put(0x80 | ((character >> shift) & 0x3F)); };
+    if (character < 0x80) {
+        put(character);
+    } else if (character < 0x800) {
+        put(0xC0 | character >> 6);
+        putRest(0);
+    } else if (character < 0x10000) {
+        put(0xE0 | character >> 12);
+        putRest(6);
+        putRest(0);
+    } else {
+        put(0xF0 | character >> 18);
+        putRest(12);
+        putRest(6);
+        putRest(0);
+    }
+}
+
 } // namespace
 
 std::size_t validUtf8Prefix(std::string_view text)
@@ -36,6 +69,23 @@ std::size_t validUtf8Prefix(std::string_view text)
         valid += length;
     }
     return valid;
+}
+
+void utf8FromUtf16(std::string_view bigEndian, std::string& out)
+{
+    const std::size_t count = bigEndian.size() / 2;
+    const auto unit = [bigEndian](std::size_t index) -> char32_t {
+        const auto byte = [bigEndian](std::size_t i) { return static_cast<unsigned char>(bigEndian[i]); };
+        return static_cast<char32_t>(byte(2 * index) << 8 | byte(2 * index + 1));
+    };
+    out.clear();
+    for (std::size_t index = 0; index < count; ++index) {
+        const char32_t first = unit(index);
+        if (isLeading(first) && index + 1 < count && isTrailing(unit(index + 1)))
+            append(out, 0x10000 + ((first - 0xD800) << 10) + (unit(++index) - 0xDC00));
+        else
+            append(out, isLeading(first) || isTrailing(first) ? kReplacement : first);
+    }
 }
 
 } // namespace pelorus

@@ -183,7 +183,7 @@ bool XmlPropertyListGuard::passElement(const Tag& tag)
     if (isKey != (parent && parent->dictionary && !parent->awaitsValue))
         return refuse(fmt::format("the XML property list has <{}> in the place of a {}", tag.name,
                                   isKey ? "value" : "key"));
-    if (!budget.takeValue(why))
+    if (!budget.takeValues(1, why))
         return false;
     if (isKey) {
         std::size_t length = 0;

@@ -61,6 +61,16 @@ TEST(BinaryPropertyList, ReadsUtf16)
         Value("xxxxxxxxxxxxxxx\xEF\xBC\xA1"));
 }
 
+TEST(BinaryPropertyList, ShowsHalvesOfSurrogatePairsAsNoCharacter)
+{
+    EXPECT_EQ(readObject("\x61\xD8\x3D"), Value("\xEF\xBF\xBD"));
+    EXPECT_EQ(readObject("\x62\xDE\0\0b"sv), Value("\xEF\xBF\xBD"
+                                                   "b"));
+    EXPECT_EQ(readObject("\x63\xD8\x3D\xD8\x3D\xDE\0"sv), Value("\xEF\xBF\xBD\xF0\x9F\x98\x80"));
+    EXPECT_EQ(readObject("\x61\x07\xFF"), Value("\xDF\xBF"));
+    EXPECT_EQ(readObject("\x62\xDB\xFF\xDF\xFF"), Value("\xF4\x8F\xBF\xBF"));
+}
+
 TEST(BinaryPropertyList, ReadsDatesToTheMicrosecond)
 {
     EXPECT_EQ(readObject(date(0)), Value(dateAt(978307200)));
@@ -187,7 +197,8 @@ TEST(BinaryPropertyList, RefusesObjectsThatAreNoValues)
                             "a\0b"sv),
               "the binary property list holds a NUL in a string");
     EXPECT_EQ(refusedObject("\x62\0a\0\0"sv), "the binary property list holds a NUL in a string");
-    EXPECT_EQ(refusedObject("\x84\xFF\xFF\xFF\xFF\xFF"), "libplist cannot read the binary property list");
+    EXPECT_EQ(refusedObject("\x84\xFF\xFF\xFF\xFF\xFF"),
+              "the binary property list holds an object of the unknown type 0x84");
 }
 
 TEST(BinaryPropertyList, RefusesKeysThatAreNoStrings)
