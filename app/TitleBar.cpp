@@ -1,5 +1,6 @@
 #include "app/TitleBar.h"
 
+#include "app/Bars.h"
 #include "app/Chevron.h"
 #include "app/ElidedLabel.h"
 #include "app/OneLine.h"
@@ -13,7 +14,6 @@ namespace pelorus {
 
 namespace {
 
-constexpr int kHeight = 48;
 constexpr int kSpace = 6;
 constexpr int kArrowSize = 16;
 constexpr int kShortestName = 64;
@@ -23,7 +23,7 @@ constexpr int kShortestName = 64;
 TitleBar::TitleBar(std::function<void()> back, QWidget* parent)
     : QWidget(parent), button(new QToolButton(this)), label(new ElidedLabel(this))
 {
-    setFixedHeight(kHeight);
+    setFixedHeight(kBarHeight);
     label->setFont(systemFont(kCellFontSize + 1, QFont::DemiBold));
     label->setAlignment(Qt::AlignCenter);
     button->setAutoRaise(true);
@@ -31,7 +31,7 @@ TitleBar::TitleBar(std::function<void()> back, QWidget* parent)
     button->setToolButtonStyle(Qt::ToolButtonTextBesideIcon);
     button->setIconSize({kArrowSize, kArrowSize});
     button->setFocusPolicy(Qt::TabFocus);
-    button->setFixedHeight(kHeight - 2 * kSpace);
+    button->setFixedHeight(kBarHeight - 2 * kSpace);
     button->hide();
     drawArrow();
     connect(button, &QToolButton::clicked, this, [back = std::move(back)] { back(); });

@@ -1,6 +1,7 @@
 #include "app/Toolbar.h"
 
 #include "app/ActivityIndicator.h"
+#include "app/Bars.h"
 #include "app/Chevron.h"
 #include "app/ElidedLabel.h"
 #include "app/TextLabel.h"
@@ -13,7 +14,6 @@ namespace pelorus {
 
 namespace {
 
-constexpr int kHeight = 48;
 constexpr int kMargin = 10;
 
 } // namespace
@@ -21,7 +21,7 @@ constexpr int kMargin = 10;
 Toolbar::Toolbar(std::function<void()> save, QWidget* parent)
     : QWidget(parent), wheel(new ActivityIndicator), label(new ElidedLabel), button(new QToolButton)
 {
-    setFixedHeight(kHeight);
+    setFixedHeight(kBarHeight);
     label->setFont(systemFont(kStatusFontSize));
     button->setFont(systemFont(kStatusFontSize));
     button->setText(tr("Save"));

@@ -9,6 +9,20 @@ target_compile_options(pelorus_compile INTERFACE -Wall -Wextra -Wpedantic
 if(PELORUS_WARNINGS_AS_ERRORS)
   target_compile_options(pelorus_compile INTERFACE -Werror)
 endif()
+# What makes a defect harder to exploit. The sanitizers catch more, and do not go together with it.
+if(PELORUS_HARDENING AND NOT PELORUS_SANITIZE)
+  include(CheckPIESupported)
+  check_pie_supported()
+  set(CMAKE_POSITION_INDEPENDENT_CODE ON)
+  target_compile_options(pelorus_compile INTERFACE -fstack-protector-strong -fstack-clash-protection
+                                                   $<$<NOT:$<CONFIG:Debug>>:-U_FORTIFY_SOURCE>
+                                                   $<$<NOT:$<CONFIG:Debug>>:-D_FORTIFY_SOURCE=2>)
+  target_link_options(pelorus_compile INTERFACE -Wl,-z,relro -Wl,-z,now -Wl,-z,noexecstack)
+endif()
+if(PELORUS_COVERAGE)
+  target_compile_options(pelorus_compile INTERFACE --coverage -fprofile-update=atomic)
+  target_link_options(pelorus_compile INTERFACE --coverage)
+endif()
 if(PELORUS_SANITIZE)
   target_compile_options(pelorus_compile INTERFACE -fsanitize=${PELORUS_SANITIZE} -fno-sanitize-recover=all
                                                    -fno-omit-frame-pointer -g)
@@ -48,4 +62,10 @@ function(pelorus_test folder)
   target_compile_options(test_${folder} PRIVATE -O0)
   set_target_properties(test_${folder} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/tests)
   gtest_discover_tests(test_${folder} TEST_PREFIX "${folder}." DISCOVERY_TIMEOUT 120)
+endfunction()
+
+# pelorus_compile_singly(TARGET...): not in a unity build. Files that say the same kind of thing call it by the same names
+# (Layout, kRows), each in its unnamed namespace.
+function(pelorus_compile_singly)
+  set_target_properties(${ARGN} PROPERTIES UNITY_BUILD OFF)
 endfunction()

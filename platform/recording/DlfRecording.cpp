@@ -10,7 +10,7 @@ namespace pelorus {
 
 namespace {
 
-constexpr std::byte kBaseband{0x01};
+constexpr std::byte kBasebandType{0x01}; // DLF keeps no type of its own
 // A version report: 161 bytes of log code 0x1FFD.
 constexpr std::array kVersionReportStart{std::byte{0xA1}, std::byte{0x00}, std::byte{0xFD}, std::byte{0x1F}};
 constexpr std::size_t kVersionReportTime = 81; // 4 bytes, seconds since 1970
@@ -51,7 +51,7 @@ RecordingReader::Next DlfRecording::next(RecordedMessage& message)
         return Next::failed;
     }
     const auto start = content.begin() + static_cast<std::ptrdiff_t>(offset + *before);
-    current.assign(1, *before == 0 ? kBaseband : start[-1]);
+    current.assign(1, *before == 0 ? kBasebandType : start[-1]);
     current.insert(current.end(), start, start + static_cast<std::ptrdiff_t>(*length));
     message = {time, current};
     offset += *before + *length;
