@@ -19,17 +19,10 @@ namespace {
 /// of `like`, if given, may be the same again, as in lists of records; they are shared then.
 bool read(plist_t node, Value& out, const Value* like = nullptr);
 
-/// libplist hands a date out in 32-bit seconds and cuts the microseconds off. What those two cannot tell
-/// comes from the date's binary form.
+/// libplist hands a date out in 32-bit seconds and cuts the microseconds off, so it comes from its binary
+/// form.
 Value dateOf(plist_t node)
 {
-    std::int32_t seconds = 0;
-    std::int32_t microseconds = 0;
-    plist_get_date_val(node, &seconds, &microseconds);
-    if (microseconds == 0 && seconds > std::numeric_limits<std::int32_t>::min() &&
-        seconds < std::numeric_limits<std::int32_t>::max())
-        return kReferenceDate + std::chrono::seconds{seconds};
-
     constexpr std::size_t position = 9; // behind "bplist00" and the date's marker
     char* bytes = nullptr;
     std::uint32_t length = 0;

@@ -37,8 +37,9 @@ Value parsePropertyList(std::span<const std::byte> bytes, std::string* why = nul
 /// Nothing when the value is nil or holds a nil somewhere, nests deeper than the limit (so also when a
 /// container holds itself), or holds a date outside the years 0 to 9999. Within its limits
 /// parsePropertyList() reads the value back equal, with these exceptions: XML dates have whole seconds and
-/// lose the fraction; NUL and bytes that are not UTF-8, which property lists cannot hold, are written as
-/// U+FFFD; a NaN is equal to nothing. Control characters are written as they are.
+/// lose the fraction; binary dates more than 136 years from 2001 are up to 16 microseconds off; NUL and bytes
+/// that are not UTF-8, which property lists cannot hold, are written as U+FFFD; a NaN is equal to nothing.
+/// Control characters are written as they are.
 std::optional<std::vector<std::byte>> serializePropertyList(const Value& value,
                                                             PropertyListForm form = PropertyListForm::xml);
 

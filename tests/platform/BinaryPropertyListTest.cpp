@@ -83,6 +83,15 @@ TEST(BinaryPropertyList, ReadsDatesToTheMicrosecond)
     EXPECT_EQ(readObject(date(-63114076800)), Value(dateAt(-62135769600)));
 }
 
+TEST(BinaryPropertyList, KeepsAMicrosecondBesideAWholeSecond)
+{
+    for (const std::int64_t microseconds : {-1, 1, 999'999})
+        EXPECT_EQ(
+            parsePropertyList(*serializePropertyList(dateAt(0, microseconds), PropertyListForm::binary)),
+            Value(dateAt(0, microseconds)))
+            << microseconds;
+}
+
 TEST(BinaryPropertyList, WritesDatesToTheMicrosecond)
 {
     for (const std::int64_t microseconds : {1, 123456, 500000, 999999}) {
