@@ -62,20 +62,20 @@ def generator_seeds():
         messages = list(messages_of(ROOT / "resources" / "samples" / f"{sample}.pcap"))
         if fuzzer == "IFX":
             for index, message in enumerate(messages[::len(messages) // 3][:3]):
-                write(fuzzer, f"message-{index}", bytes([7]) + operation(MESSAGE, message) + operation(REFRESH))
+                write(fuzzer, f"message-{index}", bytes([3]) + operation(MESSAGE, message) + operation(REFRESH))
             for name, text in LISTS.items():
-                write(fuzzer, name, bytes([4]) + operation(MESSAGE, text))
+                write(fuzzer, name, bytes([0xE0]) + operation(MESSAGE, text))
             continue
         everything = b""
         for code, packets in by_code(messages, 3).items():
-            first = bytes([7]) + b"".join(operation(FRAMED, packet) + operation(REFRESH) for packet in packets)
+            first = bytes([3]) + b"".join(operation(FRAMED, packet) + operation(REFRESH) for packet in packets)
             write(fuzzer, f"{code:04X}", first)
             everything += operation(FRAMED, packets[0])
-        write(fuzzer, "everything", bytes([0]) + everything[:6000])
+        write(fuzzer, "everything", bytes([0xE0]) + everything[:6000])
         write(fuzzer, "restart", bytes([1]) + everything[:3000] + operation(RESTART) + operation(REFRESH)
               + operation(RESTART))
         unreadable = bytes([0xFF, 20, 0, 0, 0]) + bytes(8) + b"no list "
-        write(fuzzer, "unreadable-files", bytes([6]) + operation(PREFIXED, unreadable))
+        write(fuzzer, "unreadable-files", bytes([2]) + operation(PREFIXED, unreadable))
 
 
 def plain(text):
