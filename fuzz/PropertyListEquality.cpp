@@ -93,7 +93,8 @@ bool isSame(const Value& a, const Value& b)
         return std::isnan(*b.real());
     if (a.array() && b.array())
         return std::equal(a.array()->elements.begin(), a.array()->elements.end(), b.array()->elements.begin(),
-                          b.array()->elements.end(), isSame);
+                          b.array()->elements.end(),
+                          [](const Value& one, const Value& other) { return isSame(one, other); });
     if (a.dictionary() && b.dictionary())
         return std::equal(a.dictionary()->begin(), a.dictionary()->end(), b.dictionary()->begin(),
                           b.dictionary()->end(), [](const auto& one, const auto& other) {

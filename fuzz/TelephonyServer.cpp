@@ -8,6 +8,7 @@
 #include "fuzz/ClientConnection.h"
 #include "fuzz/Input.h"
 #include "fuzz/Require.h"
+#include "platform/PrintableText.h"
 #include "platform/PropertyList.h"
 
 #include <QCoreApplication>
@@ -118,7 +119,7 @@ private:
         made.makeSource = [](std::string&) { return std::make_unique<FewMessages>(); };
         made.pace = Pace::ownTiming(0);
         made.report = [](const std::string& line) {
-            require(line.find('\n') == std::string::npos, "a report is one line");
+            require(printable(line).find('\n') == std::string::npos, "a report is one line");
         };
         return made;
     }

@@ -215,6 +215,8 @@ def main():
     generator_seeds()
     for name, content in LISTS.items():
         write("PropertyList", name, content)
+        if name.startswith("binary"):
+            write("BinaryPropertyList", name, content)
     write("PropertyListWriter", "mixed", bytes([8, 7, 1]) + b"a\0\2ab" + bytes([1]) + b"b\1" + bytes(7) + b"\5\1c\2"
           + bytes.fromhex("3ff8000000000000") + b"\1d\3\1" + b"\1e\4" + bytes(8) + b"\1f\6\3abc" + b"\1g\7\2\0\1x\1")
     frame_seeds()

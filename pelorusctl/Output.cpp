@@ -1,6 +1,6 @@
 #include "pelorusctl/Output.h"
 
-#include "pelorusctl/TreeOutput.h"
+#include "platform/PrintableText.h"
 
 #include <cerrno>
 #include <cstdio>

@@ -1,6 +1,7 @@
 #include "pelorusctl/Commands.h"
 #include "pelorusctl/Output.h"
 #include "pelorusctl/TreeOutput.h"
+#include "platform/PrintableText.h"
 #include "platform/PropertyList.h"
 #include "platform/linux/Files.h"
 

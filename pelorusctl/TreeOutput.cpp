@@ -1,8 +1,7 @@
 #include "pelorusctl/TreeOutput.h"
 
-#include "platform/Utf8.h"
+#include "platform/PrintableText.h"
 
-#include <fmt/format.h>
 #include <nlohmann/json.hpp>
 
 namespace pelorus {
@@ -25,11 +24,6 @@ void addText(std::string& out, const PelorusModelNode& node, std::size_t depth)
             addText(out, *child, depth + 1);
 }
 
-std::string escaped(unsigned char byte)
-{
-    return fmt::format("\\x{:02x}", byte);
-}
-
 Json jsonOf(const PelorusModelNode& node, std::string& path)
 {
     Json object = {{"name", node.displayName()}, {"path", path}};
@@ -49,28 +43,6 @@ Json jsonOf(const PelorusModelNode& node, std::string& path)
 }
 
 } // namespace
-
-std::string printable(std::string_view text)
-{
-    std::string shown;
-    std::size_t validEnd = validUtf8Prefix(text);
-    for (std::size_t place = 0; place < text.size(); ++place) {
-        const auto byte = [text](std::size_t at) { return static_cast<unsigned char>(text[at]); };
-        if (byte(place) == '\n') {
-            shown += "\\n";
-        } else if (place == validEnd) {
-            shown += escaped(byte(place));
-            validEnd += 1 + validUtf8Prefix(text.substr(place + 1));
-        } else if (byte(place) < 0x20 || byte(place) == 0x7F) {
-            shown += escaped(byte(place));
-        } else if (byte(place) == 0xC2 && byte(place + 1) < 0xA0) { // to a terminal U+009B is what ESC [ is
-            shown += escaped(byte(++place));
-        } else {
-            shown += text[place];
-        }
-    }
-    return shown;
-}
 
 std::string treeText(const PelorusModelNode& root)
 {

@@ -8,10 +8,6 @@
 
 namespace pelorus {
 
-/// Control characters and bytes that are no UTF-8 as "\n", "\x1b": what a value holds must not steer a
-/// terminal or break a line.
-std::string printable(std::string_view text);
-
 /// The tree as text: a line a node, two blanks of indentation a level, "name: value" a leaf.
 std::string treeText(const PelorusModelNode& root);
 

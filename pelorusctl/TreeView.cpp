@@ -2,6 +2,7 @@
 
 #include "pelorusctl/Screen.h"
 #include "pelorusctl/TreeOutput.h"
+#include "platform/PrintableText.h"
 
 #include <algorithm>
 #include <fmt/format.h>

@@ -1,3 +1,4 @@
+#include "platform/PrintableText.h"
 #include "platform/linux/PassedSockets.h"
 #include "platform/linux/SignalWatch.h"
 #include "telephonyd/Options.h"
@@ -17,7 +18,7 @@ namespace {
 
 void report(const std::string& line)
 {
-    fmt::print(stderr, "{}\n", line);
+    fmt::print(stderr, "{}\n", printable(line)); // clients choose the names of their ports
 }
 
 int fail(const std::string& line)

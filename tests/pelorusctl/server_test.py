@@ -170,6 +170,16 @@ class ServerTest(Scratch):
         self.assertEqual(self.client().technology(), "Osprey LTE")
         self.end(server)
 
+    def test_a_clients_port_name_cannot_pretend_to_be_a_report(self):
+        server = self.serve("--simulate", "Osprey LTE")
+        client = connect(self.path("ports"), "io.pelorus.TelephonyServer")
+        self.addCleanup(client.close)
+        name = "nobody\nlistening on /elsewhere"
+        client.sendall(frame(plistlib.dumps({"CreateLogChannel": name}), REQUEST, 1, 1))
+        self.assertEqual(plistlib.loads(receive(client)[0])["Error"], 1)
+        self.assertIn(r'"nobody\nlistening on /elsewhere"', server.stderr.readline())
+        self.end(server)
+
     def test_takes_the_place_of_one_that_was_killed(self):
         server = self.serve("--simulate", "Osprey LTE")
         server.kill()
