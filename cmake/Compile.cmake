@@ -28,7 +28,7 @@ if(PELORUS_SANITIZE)
                                                    -fno-omit-frame-pointer -g)
   target_link_options(pelorus_compile INTERFACE -fsanitize=${PELORUS_SANITIZE})
   # GCC's manual: under sanitizers this warning is wrong too often for -Werror. The plain build keeps it.
-  target_compile_options(pelorus_compile INTERFACE $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>)
+  target_compile_options(pelorus_compile INTERFACE -Wno-maybe-uninitialized)
 endif()
 
 # pelorus_library(NAME LIBRARIES...): a static library of the sources in the current folder.
