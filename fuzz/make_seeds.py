@@ -87,9 +87,7 @@ def xml(body, head='<?xml version="1.0" encoding="UTF-8"?>\n'):
     return f'{head}<plist version="1.0">{body}</plist>'.encode()
 
 
-def shared_references(levels, width):
-    """A binary list of arrays whose elements are all the next array: width to the power of levels values."""
-    objects = [bytes([0xA0 | width]) + bytes([level + 1] * width) for level in range(levels)] + [b"\x51a"]
+def binary_list(objects):
     offsets, content = [], b"bplist00"
     for item in objects:
         offsets.append(len(content))
@@ -97,6 +95,21 @@ def shared_references(levels, width):
     table = len(content)
     content += b"".join(struct.pack(">H", offset) for offset in offsets)
     return content + bytes(6) + bytes([2, 1]) + struct.pack(">QQQ", len(objects), 0, table)
+
+
+def shared_references(levels, width):
+    """A binary list of arrays whose elements are all the next array: width to the power of levels values."""
+    objects = [bytes([0xA0 | width]) + bytes([level + 1] * width) for level in range(levels)] + [b"\x51a"]
+    return binary_list(objects)
+
+
+def long_paths(levels, key_length, elements):
+    """A binary list of dictionaries in one another, in the last a long array: each element has a long path."""
+    key, other, text, array = range(levels, levels + 4)
+    objects = [bytes([0xD2, key, other, level + 1 if level + 1 < levels else array, text]) for level in range(levels)]
+    objects += [b"\x5F\x11" + struct.pack(">H", key_length) + b"k" * key_length, b"\x51o", b"\x50",
+                b"\xAF\x11" + struct.pack(">H", elements) + bytes([text]) * elements]
+    return binary_list(objects)
 
 
 MIXED = {
@@ -122,6 +135,7 @@ LISTS = {
     "binary-real": plistlib.dumps([1.5, float("nan"), float("-inf")], fmt=plistlib.FMT_BINARY),
     "binary-shared": shared_references(4, 8),
     "binary-much-shared": shared_references(12, 14),
+    "binary-long-paths": long_paths(200, 200, 8000),
     "binary-itself": shared_references(1, 1).replace(b"\xa1\x01", b"\xa1\x00"),
 }
 

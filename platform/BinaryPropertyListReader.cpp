@@ -19,6 +19,7 @@ namespace {
 
 constexpr std::size_t kHeaderLength = 8;   // "bplist00"
 constexpr std::size_t kTrailerLength = 32; // unused 6, offset size, reference size, three 64-bit numbers
+constexpr std::size_t kIndexLength = 2;    // in a path: a slash and one digit at least
 constexpr std::size_t kSharedKeys = 1024;  // of the first objects; later keys are read anew each time
 
 /// Walks a list from its root, so that an object counts as often as it is referred to. A cycle of references
@@ -85,6 +86,7 @@ private:
     std::uint64_t root = 0;
     std::uint64_t offsetTable = 0; // also where the objects end
     std::size_t depth = 0;
+    std::uint64_t pathLength = 0;            // of the container that is being read
     std::vector<std::optional<Key>> keys;    // by object; records of one kind share theirs
     std::span<const std::byte> distinctKeys; // references of a dictionary's keys that are known to differ
 };
@@ -259,7 +261,9 @@ bool BinaryPropertyListReader::enter(const Object& object, std::uint64_t referen
 {
     return lies(object, object.count, referencesPerElement * referenceSize) &&
            budget.allowsDepth(depth + 1, why) &&
-           budget.takeValues(object.count * referencesPerElement, why); // before memory is reserved for them
+           budget.takeValues(object.count * referencesPerElement,
+                             why) && // before memory is reserved for them
+           budget.takePaths(object.count, pathLength, why);
 }
 
 bool BinaryPropertyListReader::readArray(const Object& object, Value& out)
@@ -269,9 +273,11 @@ bool BinaryPropertyListReader::readArray(const Object& object, Value& out)
     ++depth;
     auto array = makeArray();
     array->elements.reserve(object.count);
+    pathLength += kIndexLength;
     for (std::uint64_t index = 0; index < object.count; ++index)
         if (!readValue(reference(object, index), array->elements.emplace_back()))
             return false;
+    pathLength -= kIndexLength;
     out = std::move(array);
     --depth;
     return true;
@@ -291,8 +297,11 @@ bool BinaryPropertyListReader::readDictionary(const Object& object, Value& out)
         if (&key == &unshared || !key ? !readKey(keyObject, key)
                                       : !budget.takeBytes(key->text().size(), why)) // who shows it copies it
             return false;
+        const std::size_t keyLength = key->text().size() + 1;
+        pathLength += keyLength;
         if (!readValue(reference(object, object.count + index), dictionary->append(*key)))
             return false;
+        pathLength -= keyLength;
     }
     const auto itsKeys = bytes.subspan(object.content, object.count * referenceSize);
     if (!std::equal(itsKeys.begin(), itsKeys.end(), distinctKeys.begin(), distinctKeys.end())) {

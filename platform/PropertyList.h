@@ -20,6 +20,8 @@ struct PropertyListLimits {
     /// Of text and data beyond the list's own length, after expansion: a snapshot's raw log may be as long as
     /// the file, and only shared references can make more of it.
     static constexpr std::size_t expansion = 64 * 1024 * 1024;
+    /// Of the values' paths, each from the root and counted anew: who shows a list has an index of them.
+    static constexpr std::size_t paths = 128 * 1024 * 1024;
     /// Steps of the two things whose cost libplist lets grow with the square of a list's size, both in XML:
     /// the keys of one dictionary, some 18,000 of which are allowed, and the entities of one text, half a
     /// megabyte of which may be nothing else. Ten nanoseconds or so each.

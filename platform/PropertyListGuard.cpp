@@ -35,6 +35,16 @@ bool PropertyListBudget::takeSteps(std::uint64_t count, std::string& why)
     return true;
 }
 
+bool PropertyListBudget::takePaths(std::uint64_t count, std::uint64_t length, std::string& why)
+{
+    if (length > 0 && count > paths / length) {
+        why = fmt::format("the property list has more than {} bytes of paths", PropertyListLimits::paths);
+        return false;
+    }
+    paths -= count * length;
+    return true;
+}
+
 bool PropertyListBudget::allowsDepth(std::size_t containers, std::string& why)
 {
     if (containers <= PropertyListLimits::depth)

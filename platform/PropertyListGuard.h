@@ -24,12 +24,15 @@ public:
     bool takeValues(std::uint64_t count, std::string& why);
     bool takeBytes(std::uint64_t count, std::string& why);
     bool takeSteps(std::uint64_t count, std::string& why);
+    /// For so many values in a container whose own path is so long.
+    bool takePaths(std::uint64_t count, std::uint64_t length, std::string& why);
     static bool allowsDepth(std::size_t containers, std::string& why);
 
 private:
     std::size_t values = PropertyListLimits::values;
     std::uint64_t bytes;
     std::uint64_t steps = PropertyListLimits::steps;
+    std::uint64_t paths = PropertyListLimits::paths;
 };
 
 /// Property lists count time from here.

@@ -29,6 +29,8 @@ private:
         bool awaitsValue; // its last element was a key
         std::uint64_t keys;
         std::uint64_t keyBytes;
+        std::uint64_t pathLength;
+        std::uint64_t nameLength; // of the element that comes: its key, or its place in an array
 
         std::string_view name() const { return dictionary ? "dict" : "array"; }
     };
@@ -194,16 +196,21 @@ bool XmlPropertyListGuard::passElement(const Tag& tag)
         parent->awaitsValue = true;
         ++parent->keys;
         parent->keyBytes += length;
+        parent->nameLength = length;
         return true;
     }
-    if (parent)
+    if (parent) {
         parent->awaitsValue = false;
+        if (!budget.takePaths(1, parent->pathLength, why))
+            return false;
+    }
     if (tag.name != "array" && tag.name != "dict")
         return passScalar(tag);
     if (!budget.allowsDepth(depth + 1, why))
         return false;
     if (!tag.empty)
-        open[depth++] = {tag.name == "dict", false, 0, 0};
+        open[depth++] = {
+            tag.name == "dict", false, 0, 0, parent ? parent->pathLength + parent->nameLength + 1 : 0, 1};
     return true;
 }
 

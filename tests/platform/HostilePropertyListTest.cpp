@@ -121,6 +121,34 @@ TEST(HostilePropertyList, SharedReferencesThatExpand)
     EXPECT_NE(refusal(keys.object("\x09").bytes()), "");
 }
 
+/// Fifty dictionaries in one another under keys of 10,000 bytes each, in the last an array of so many
+/// elements.
+std::string binaryWithLongPaths(std::size_t elements)
+{
+    BinaryListBuilder list;
+    for (std::uint64_t level = 0; level < 50; ++level)
+        list.dictionary({50}, {level == 49 ? 51 : level + 1});
+    return list.string(std::string(10'000, 'k'))
+        .array(std::vector<std::uint64_t>(elements, 52))
+        .object("\x09")
+        .bytes();
+}
+
+std::string xmlWithLongPaths(std::size_t elements)
+{
+    return repeated("<dict><key>" + std::string(10'000, 'k') + "</key>", 50) + "<array>" +
+           repeated("<true/>", elements) + "</array>" + repeated("</dict>", 50);
+}
+
+// Who shows such a list would hold each element's whole path: of these, half a megabyte each.
+TEST(HostilePropertyList, ManyLongPaths)
+{
+    for (const auto& list : {binaryWithLongPaths, xmlWithLongPaths}) {
+        EXPECT_EQ(refusal(list(280)), "the property list has more than 134217728 bytes of paths");
+        EXPECT_EQ(refusal(list(240)), "");
+    }
+}
+
 TEST(HostilePropertyList, ALongRawLogIsNoExpansion)
 {
     const Value log = makeData(std::vector<std::byte>(70 * 1024 * 1024, std::byte{0x5A}));
