@@ -72,13 +72,15 @@ void LogGenerator::updateHistoryInState(Platform& platform, State& state)
         entries.erase(entries.begin(), entries.end() - (kHistoryLength - 1));
 
     auto snapshot = makeDictionary();
+    const Value before = entries.empty() ? Value() : entries.back();
     // An entry ends at the first value that is missing, whatever would come after it: meant.
     const auto add = [&] {
         for (const Label label : {Label("DisplayState"), Label("Display"), Label("ExtraInfo")}) {
             const Value* value = state.find(label.text);
             if (!value)
                 return;
-            snapshot->set(label, deepCopy(*value));
+            const Value* earlier = before.dictionary() ? before.dictionary()->find(label.text) : nullptr;
+            snapshot->set(label, deepCopySharing(*value, earlier ? *earlier : Value()));
         }
         snapshot->set(Label("Date"), dateText(platform.now()));
         snapshot->set(Label("Description"), fmt::format("Snapshot ({})", dateText(platform.now())));

@@ -114,23 +114,60 @@ Data makeData(std::vector<std::byte> bytes)
     return std::make_shared<const std::vector<std::byte>>(std::move(bytes));
 }
 
-Value deepCopy(const Value& value)
+namespace {
+
+bool equalInOrder(const Value& a, const Value& b)
 {
+    if (a.array() && b.array())
+        return std::equal(a.array()->elements.begin(), a.array()->elements.end(), b.array()->elements.begin(),
+                          b.array()->elements.end(), equalInOrder);
+    if (a.dictionary() && b.dictionary())
+        return std::equal(a.dictionary()->begin(), a.dictionary()->end(), b.dictionary()->begin(),
+                          b.dictionary()->end(), [](const auto& left, const auto& right) {
+                              return left.key == right.key && equalInOrder(left.value, right.value);
+                          });
+    return a == b;
+}
+
+Value copyBeside(const Value& value, const Value* earlier)
+{
+    if (earlier && equalInOrder(value, *earlier))
+        return *earlier;
     if (const Array* array = value.array()) {
+        const Array* const other = earlier ? earlier->array() : nullptr;
         auto copy = makeArray();
         copy->elements.reserve(array->elements.size());
-        for (const Value& element : array->elements)
-            copy->elements.push_back(deepCopy(element));
+        for (std::size_t i = 0; i < array->elements.size(); ++i)
+            copy->elements.push_back(copyBeside(
+                array->elements[i], other && i < other->elements.size() ? &other->elements[i] : nullptr));
         return copy;
     }
     if (const Dictionary* dictionary = value.dictionary()) {
-        auto copy = std::make_shared<Dictionary>();
+        const Dictionary* const other = earlier ? earlier->dictionary() : nullptr;
+        auto copy = makeDictionary();
         copy->reserve(dictionary->size());
-        for (const auto& entry : *dictionary)
-            copy->append(entry.key, deepCopy(entry.value));
+        for (const auto& entry : *dictionary) {
+            const Value* const before =
+                other && copy->size() < other->size()
+                    ? &(other->begin() + static_cast<std::ptrdiff_t>(copy->size()))->value
+                    : nullptr;
+            copy->append(entry.key, copyBeside(entry.value, before));
+        }
         return copy;
     }
     return value;
+}
+
+} // namespace
+
+Value deepCopy(const Value& value)
+{
+    return copyBeside(value, nullptr);
+}
+
+Value deepCopySharing(const Value& value, const Value& earlier)
+{
+    return copyBeside(value, &earlier);
 }
 
 std::optional<std::int32_t> signed32(const Value* value)

@@ -217,6 +217,14 @@ Data makeData(std::vector<std::byte> bytes);
 
 /// A value that shares no container with the original. Data, which cannot change, stays shared.
 Value deepCopy(const Value& value);
+/// As deepCopy(), but containers that equal their counterparts in `earlier`, entry by entry in the same
+/// order, are those: of two displays that few rows tell apart only those sections are copied. Neither value
+/// may be changed then.
+Value deepCopySharing(const Value& value, const Value& earlier);
+/// As deepCopy(), but what equals its counterpart in `earlier`, entry by entry in the same order, is shared
+/// with that: of two displays that few rows tell apart only those rows are copied. Neither may be changed
+/// then.
+Value deepCopySharing(const Value& value, const Value& earlier);
 
 /// Reads a number as telephony servers send them: an integer, or a string of decimal digits with an optional
 /// sign. A value outside the signed 32-bit range keeps its low 32 bits. Nothing for any other value.

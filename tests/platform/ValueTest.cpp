@@ -71,6 +71,40 @@ TEST(Value, EqualityOfDictionariesTakesAnyOrder)
     EXPECT_FALSE(ab == Value(makeDictionary({{"a", 1}})));
 }
 
+TEST(Value, DeepCopySharesWhatDidNotChangeWithAnEarlierCopy)
+{
+    const Value shown = makeDictionary(
+        {{"Cell", makeDictionary({{"PCI", "31"}, {"EARFCN", "1850"}})},
+         {"Neighbours", makeArray({makeDictionary({{"PCI", "7"}}), makeDictionary({{"PCI", "8"}})})}});
+    const auto part = [](const Value& copy, std::string_view name) { return *copy.dictionary()->find(name); };
+    const Value first = deepCopySharing(shown, {});
+    EXPECT_EQ(first, shown);
+    EXPECT_NE(first.dictionary(), shown.dictionary());
+    EXPECT_EQ(deepCopySharing(shown, first).dictionary(), first.dictionary());
+
+    part(shown, "Neighbours").array()->elements[1].dictionary()->set("PCI", "9");
+    const Value second = deepCopySharing(shown, first);
+    EXPECT_EQ(second, shown);
+    EXPECT_EQ(part(second, "Cell").dictionary(), part(first, "Cell").dictionary());
+    EXPECT_EQ(part(second, "Neighbours").array()->elements[0].dictionary(),
+              part(first, "Neighbours").array()->elements[0].dictionary());
+    EXPECT_EQ(*part(first, "Neighbours").array()->elements[1].dictionary()->find("PCI"), Value("8"));
+
+    part(shown, "Neighbours").array()->elements.pop_back();
+    part(shown, "Cell").dictionary()->remove("PCI");
+    const Value third = deepCopySharing(shown, second);
+    EXPECT_EQ(third, shown);
+    EXPECT_NE(part(third, "Cell").dictionary(), part(shown, "Cell").dictionary());
+    EXPECT_NE(part(third, "Neighbours").array(), part(shown, "Neighbours").array());
+}
+
+TEST(Value, DeepCopyKeepsAnOrderThatTheEarlierCopyHasNot)
+{
+    const Value earlier = makeDictionary({{"a", "1"}, {"b", "2"}});
+    const Value copy = deepCopySharing(makeDictionary({{"b", "2"}, {"a", "1"}}), earlier);
+    EXPECT_EQ(copy.dictionary()->begin()->key.text(), "b");
+}
+
 TEST(Value, DeepCopySharesNoContainer)
 {
     const auto inner = makeDictionary({{"Level", "-90"}});
