@@ -27,8 +27,14 @@ public:
     virtual std::vector<LogCode> getLogCodeArray() const;
     virtual void updateWithData(const LogPacket& data, LogCode logCode);
 
+    /// As updateWithData(), but what the packet shows may wait until settle(), when it is known which packets
+    /// were overtaken by others.
+    virtual void receive(const LogPacket& data, LogCode logCode) { updateWithData(data, logCode); }
+    /// Brings the display entry up to date. Whoever looks at it settles first.
+    virtual void settle() {}
+
     /// Binds the section to its display entry, a dictionary or an array.
-    void updateSectionRef(const Value& entry);
+    virtual void updateSectionRef(const Value& entry);
     void updateLogCodeDict(CodeDictionary& codeDict);
 
     static void clearElementsInArray(Array& array);

@@ -16,6 +16,12 @@ Base* ClassIndex::getClass(const std::string& sectionName) const
     return found == classDict.end() ? nullptr : found->second;
 }
 
+void ClassIndex::settle()
+{
+    for (Base* section : sections)
+        section->settle();
+}
+
 void ClassIndex::status() const
 {
     // The class dictionary is a dictionary and no string, always: only the lines themselves tell something.

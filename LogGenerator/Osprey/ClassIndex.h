@@ -26,6 +26,8 @@ public:
     {
         return codeDictionary.find(code);
     }
+    /// Brings the display entries of all sections up to date.
+    void settle();
     /// Decimal texts, each code once.
     std::vector<std::string> getAllLogCodes() const { return codeDictionary.allKeys(); }
     /// A diagnostic for the system log.
@@ -37,11 +39,13 @@ protected:
     {
         auto section = std::make_unique<Section>();
         section->initWithDict(classDict, codeDictionary);
+        sections.push_back(section.get());
         return section;
     }
 
 private:
     ClassDictionary classDict;
+    std::vector<Base*> sections; // in creation order; of two with one name the dictionary has the later
     CodeDictionary codeDictionary;
 };
 

@@ -1,6 +1,5 @@
 #include "LogGenerator/Osprey/CodeDictionary.h"
 
-#include <algorithm>
 #include <charconv>
 
 namespace pelorus {
@@ -9,9 +8,12 @@ CodeDictionary::Subscribers& CodeDictionary::operator[](std::string_view decimal
 {
     LogCode code = 0;
     std::from_chars(decimalCode.data(), decimalCode.data() + decimalCode.size(), code);
-    const auto found = std::find_if(entries.begin(), entries.end(),
-                                    [code](const Entry& entry) { return entry.code == code; });
-    return found != entries.end() ? found->subscribers : entries.emplace_back(Entry{code, {}}).subscribers;
+    std::uint8_t& place = places[placeOf(code)];
+    if (place == 0) {
+        entries.push_back({code, {}});
+        place = static_cast<std::uint8_t>(entries.size());
+    }
+    return entries[place - 1].subscribers;
 }
 
 std::vector<std::string> CodeDictionary::allKeys() const

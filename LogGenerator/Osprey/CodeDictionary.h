@@ -25,10 +25,8 @@ public:
     /// nullptr when nobody subscribed.
     const Subscribers* find(LogCode code) const
     {
-        for (const Entry& entry : entries)
-            if (entry.code == code)
-                return &entry.subscribers;
-        return nullptr;
+        const std::size_t place = places[placeOf(code)];
+        return place == 0 ? nullptr : &entries[place - 1].subscribers;
     }
     std::vector<std::string> allKeys() const;
 
@@ -37,7 +35,14 @@ private:
         LogCode code;
         Subscribers subscribers;
     };
-    std::vector<Entry> entries; // a few dozen at most
+    /// A number of its own for each of the codes that there can be.
+    static std::size_t placeOf(LogCode code)
+    {
+        return (code & 0xFFFF) | (code >= kInternalCodes ? 0x10000U : 0U);
+    }
+
+    std::vector<Entry> entries;                                            // a few dozen at most
+    std::vector<std::uint8_t> places = std::vector<std::uint8_t>(0x20000); // of the entries, from 1; 0: none
 };
 
 } // namespace pelorus

@@ -20,6 +20,7 @@ void OSPLogGenerator2::initWithPListName(std::string templateName, std::shared_p
 
 OSPLogGenerator2::~OSPLogGenerator2()
 {
+    settle(); // the display may outlive its generator
     // Says OSP_GSM whatever the technology: meant.
     systemLog(kLogWarning, "OSP_GSMLogGenerator is destructed %p", static_cast<const void*>(this));
 }
@@ -53,11 +54,18 @@ void OSPLogGenerator2::updateWithData(std::span<const std::byte> data)
         return;
     if (const auto* subscribers = cIndex->getSubscribers(code))
         for (Base* section : *subscribers)
-            section->updateWithData(packet, code);
+            section->receive(packet, code);
+}
+
+void OSPLogGenerator2::settle()
+{
+    if (cIndex)
+        cIndex->settle();
 }
 
 Value OSPLogGenerator2::getDisplayFromState(State& state)
 {
+    settle();
     if (const Value* display = state.find("Display"))
         return *display;
     Value pattern = state.at("Template");

@@ -22,7 +22,8 @@ public:
     /// Strips the framing of one message (optional 2-byte prefix when byte 0 is 0x81; log type 1 or 0xFF; log
     /// code at 3, little-endian) and calls the subscribers. Anything else is dropped.
     void updateWithData(std::span<const std::byte> data);
-    /// The state's display. The call that builds it returns nil, only later ones return it: meant.
+    /// The state's display, up to date. Between two calls packets that others overtook are not shown in it.
+    /// The call that builds it returns nil, only later ones return it: meant.
     Value getDisplayFromState(State& state);
     /// A copy of a template object, with the sections bound to their entries in it. Throws
     /// std::invalid_argument for a template that holds anything but dictionaries, arrays and strings.
@@ -42,6 +43,7 @@ protected:
 private:
     /// Before this generator's first use of a state that others may have used.
     void takeOver(State& state);
+    void settle();
     void bindSections(const Value& display);
     void bindSection(const Key& name, const Value& entry);
     Value loadTemplate();

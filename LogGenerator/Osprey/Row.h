@@ -35,6 +35,17 @@ public:
         return {};
     }
 
+    /// Whether it lists all values that a field can have; a field of more than 8 bits is not asked.
+    constexpr bool listsEvery(Field field) const
+    {
+        if (field.isSigned || field.bitCount > 8)
+            return false;
+        for (std::int64_t value = 0; value < std::int64_t{1} << field.bitCount; ++value)
+            if (at(value).empty())
+                return false;
+        return true;
+    }
+
 private:
     std::span<const std::string_view> run;
     std::span<const ValueText> scattered;

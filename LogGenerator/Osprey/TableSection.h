@@ -7,10 +7,16 @@
 
 #include <span>
 #include <string_view>
+#include <vector>
 
 namespace pelorus {
 
 class TableSection;
+
+/// Whether the later of two packets shows all the rows that the earlier one shows, so that nobody who looks
+/// at the display behind both sees anything of the earlier one.
+using Overtakes = bool(const LogPacket& earlier, const LogPacket& later);
+Overtakes overtakesAlways;
 
 /// What a section does with the packets of one log code: nothing when they are shorter than `minimumLength`
 /// bytes; else it shows `rows` in its keyed entry and then calls `show`, where each is given.
@@ -19,6 +25,9 @@ struct Reading {
     std::size_t minimumLength;
     std::span<const Row> rows = {};
     void (*show)(TableSection& section, const LogPacket& data) = nullptr;
+    /// For a `show` that keeps nothing of its own and raises nothing: packets need not be shown that others
+    /// overtake between two looks at the display. Rows alone need no leave.
+    Overtakes* overtakes = nullptr;
 };
 
 enum class UnknownCode : std::uint8_t { logged, ignored };
@@ -35,11 +44,14 @@ struct SectionDescription {
 /// A section as its description says it. The order of the readings is the order of subscription.
 class TableSection : public Base {
 public:
-    explicit TableSection(const SectionDescription& what) : description(what) {}
+    explicit TableSection(const SectionDescription& what);
 
     std::string getSectionName() const override { return std::string(description.name); }
     std::vector<LogCode> getLogCodeArray() const override;
     void updateWithData(const LogPacket& data, LogCode logCode) override;
+    void receive(const LogPacket& data, LogCode logCode) override;
+    void settle() override;
+    void updateSectionRef(const Value& entry) override;
 
     // For the readings' functions.
 
@@ -69,8 +81,21 @@ public:
     static void logUnknownCode(LogCode code);
 
 private:
+    struct Source {
+        const Reading& reading;
+        Overtakes* overtakes; // null when every packet must be shown
+        bool shown = false;   // a packet since the section was bound, so that its rows are there
+        std::vector<std::byte> waiting = {};
+    };
+
+    /// The source of a packet that is to be shown; null when it is none of the section's, or too short.
+    Source* accept(const LogPacket& data, LogCode logCode);
+    void show(Source& source, const LogPacket& data);
+
     const SectionDescription& description;
     ListRewriter rewriter;
+    std::vector<Source> sources;
+    std::vector<Source*> waitingSources; // in the order in which their packets came
 };
 
 } // namespace pelorus

@@ -38,7 +38,7 @@ void showCells(TableSection& section, const LogPacket& data)
     });
 }
 
-constexpr Reading kReadings[] = {{0x417A, Layout::minimumLength, {}, showCells}};
+constexpr Reading kReadings[] = {{0x417A, Layout::minimumLength, {}, showCells, overtakesAlways}};
 constexpr SectionDescription kDescription{"Active Set", "ActiveSet", kReadings};
 
 } // namespace

@@ -20,7 +20,7 @@ void showChannels(TableSection& section, const LogPacket& data)
                      static_cast<std::size_t>(data[Layout::channelCount]), kChannelRows);
 }
 
-constexpr Reading kReadings[] = {{0x4116, Layout::minimumLength, kRows, showChannels}};
+constexpr Reading kReadings[] = {{0x4116, Layout::minimumLength, kRows, showChannels, overtakesAlways}};
 constexpr SectionDescription kDescription{"BLER", "BLER", kReadings};
 
 } // namespace

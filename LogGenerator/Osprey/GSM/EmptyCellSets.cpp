@@ -11,7 +11,7 @@ void showNoCell(TableSection& section, const LogPacket&)
     section.clearList();
 }
 
-constexpr Reading kReadings[] = {{0x417A, LogCode_0x417A::minimumLength, {}, showNoCell}};
+constexpr Reading kReadings[] = {{0x417A, LogCode_0x417A::minimumLength, {}, showNoCell, overtakesAlways}};
 constexpr SectionDescription kDetectedSet{"Detected Set", "DetectedSet", kReadings};
 constexpr SectionDescription kMonitoredSet{"Monitored Set", "MonitoredSet", kReadings};
 constexpr SectionDescription kVirtualActiveSet{"Virtual Active Set", "VirtualActiveSet", kReadings};

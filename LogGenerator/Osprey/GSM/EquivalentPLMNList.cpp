@@ -27,7 +27,7 @@ void showNetworks(TableSection& section, const LogPacket& data)
     });
 }
 
-constexpr Reading kReadings[] = {{0x7150, Layout::minimumLength, {}, showNetworks}};
+constexpr Reading kReadings[] = {{0x7150, Layout::minimumLength, {}, showNetworks, overtakesAlways}};
 constexpr SectionDescription kDescription{"Equivalent PLMN List", "Equivalent PLMN List", kReadings};
 
 } // namespace

@@ -20,7 +20,7 @@ void showCells(TableSection& section, const LogPacket& data)
     section.showList(data, Layout::gsmCells, static_cast<std::size_t>(data[Layout::gsmCellCount]), kCellRows);
 }
 
-constexpr Reading kReadings[] = {{0x4005, Layout::minimumLength, {}, showCells}};
+constexpr Reading kReadings[] = {{0x4005, Layout::minimumLength, {}, showCells, overtakesAlways}};
 constexpr SectionDescription kDescription{"GSM Set", "GSMSet", kReadings};
 
 } // namespace

@@ -29,6 +29,23 @@ void showProcesses(TableSection& section, Label row, PacketView data, Records pr
         section.showList(*section.listRow(row), data, processes, count, kProcessRows);
 }
 
+std::size_t primaryProcesses(const LogPacket& data)
+{
+    return data.wholeRecords(Layout::primaryProcesses, static_cast<std::size_t>(data[Layout::primaryCount]));
+}
+
+std::size_t secondaryProcesses(const LogPacket& data)
+{
+    return data.wholeRecords(Layout::secondaryProcesses(static_cast<std::size_t>(data[Layout::primaryCount])),
+                             static_cast<std::size_t>(data[Layout::secondaryCount]));
+}
+
+bool overtakesWithProcesses(const LogPacket& earlier, const LogPacket& later)
+{
+    return (primaryProcesses(later) > 0 || primaryProcesses(earlier) == 0) &&
+           (secondaryProcesses(later) > 0 || secondaryProcesses(earlier) == 0);
+}
+
 void showBothCarriers(TableSection& section, const LogPacket& data)
 {
     const auto primary = static_cast<std::size_t>(data[Layout::primaryCount]);
@@ -37,7 +54,8 @@ void showBothCarriers(TableSection& section, const LogPacket& data)
     showProcesses(section, "Secondary HARQ Process", data, Layout::secondaryProcesses(primary), secondary);
 }
 
-constexpr Reading kReadings[] = {{0x4221, Layout::minimumLength, kRows, showBothCarriers}};
+constexpr Reading kReadings[] = {
+    {0x4221, Layout::minimumLength, kRows, showBothCarriers, overtakesWithProcesses}};
 constexpr SectionDescription kDescription{"HSDPA Info", "HSDPA Info", kReadings, UnknownCode::ignored};
 
 } // namespace

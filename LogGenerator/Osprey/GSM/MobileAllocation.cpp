@@ -19,7 +19,7 @@ void showChannels(TableSection& section, const LogPacket& data)
     });
 }
 
-constexpr Reading kReadings[] = {{0x51F8, Layout::minimumLength, kRows, showChannels}};
+constexpr Reading kReadings[] = {{0x51F8, Layout::minimumLength, kRows, showChannels, overtakesAlways}};
 constexpr SectionDescription kDescription{"Mobile Allocation", "MobileAllocation", kReadings};
 
 } // namespace

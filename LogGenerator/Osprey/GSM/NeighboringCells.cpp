@@ -59,7 +59,7 @@ void showMonitoredCells(TableSection& section, const LogPacket& data)
 }
 
 constexpr Reading kReadings[] = {
-    {0x5137, Measurement::minimumLength, {}, showNeighbours},
+    {0x5137, Measurement::minimumLength, {}, showNeighbours, overtakesAlways},
     {0x51FF, LogCode_0x51FF::minimumLength, {}, keepIdentities},
     {kCellMonitorList, 0, {}, showMonitoredCells},
 };

@@ -52,7 +52,7 @@ void showMonitoredCell(TableSection& section, const LogPacket& data)
 }
 
 constexpr Reading kReadings[] = {
-    {0x7135, Area::minimumLength, {}, showArea},
+    {0x7135, Area::minimumLength, {}, showArea, overtakesAlways},
     {0x7132, LogCode_0x7132::minimumLength, kSelectionRows},
     {kCellMonitorList, 0, {}, showMonitoredCell},
 };

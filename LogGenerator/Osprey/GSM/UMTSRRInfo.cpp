@@ -73,8 +73,8 @@ void showMonitoredCell(TableSection& section, const LogPacket& data)
 
 constexpr Reading kReadings[] = {
     {0x4125, LogCode_0x4125::minimumLength, kStateRows},
-    {0x4031, LogCode_0x4031::minimumLength, {}, showTransmitPower},
-    {0x4127, Cell::minimumLength, kCellRows, dropMonitorFrequency},
+    {0x4031, LogCode_0x4031::minimumLength, {}, showTransmitPower, overtakesAlways},
+    {0x4127, Cell::minimumLength, kCellRows, dropMonitorFrequency, overtakesAlways},
     {0x4157, LogCode_0x4157::minimumLength, kCipheringRows},
     {kCellMonitorList, 0, {}, showMonitoredCell},
 };

@@ -37,7 +37,7 @@ void showMonitoredCells(TableSection& section, const LogPacket& data)
 }
 
 constexpr Reading kReadings[] = {
-    {0x4005, Layout::minimumLength, {}, showCells},
+    {0x4005, Layout::minimumLength, {}, showCells, overtakesAlways},
     {kCellMonitorList, 0, {}, showMonitoredCells},
 };
 constexpr SectionDescription kDescription{"UMTS Set", "UMTSSet", kReadings};

@@ -16,7 +16,7 @@ void showCells(TableSection& section, const LogPacket& data)
                      static_cast<std::size_t>(data[Layout::detectedCount]), kCellRows);
 }
 
-constexpr Reading kReadings[] = {{0xB179, Layout::minimumLength, {}, showCells}};
+constexpr Reading kReadings[] = {{0xB179, Layout::minimumLength, {}, showCells, overtakesAlways}};
 constexpr SectionDescription kDescription{"Detected Cells", "Detected Cells", kReadings};
 
 } // namespace

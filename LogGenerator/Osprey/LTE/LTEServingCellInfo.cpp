@@ -55,8 +55,8 @@ void showMonitoredCell(TableSection& section, const LogPacket& data)
 }
 
 constexpr Reading kReadings[] = {
-    {0xB0C2, Configuration::minimumLength, kConfigurationRows, dropMonitorFrequency},
-    {0xB0C1, LogCode_0xB0C1::minimumLength, kAntennaRows, logAsUnknown},
+    {0xB0C2, Configuration::minimumLength, kConfigurationRows, dropMonitorFrequency, overtakesAlways},
+    {0xB0C1, LogCode_0xB0C1::minimumLength, kAntennaRows, logAsUnknown, overtakesAlways},
     {kCellMonitorList, 0, {}, showMonitoredCell},
 };
 constexpr SectionDescription kDescription{"Serving Cell Info", "LTE Serving Cell Info", kReadings};

@@ -19,7 +19,7 @@ void showCells(TableSection& section, const LogPacket& data)
                      kCellRows);
 }
 
-constexpr Reading kReadings[] = {{0xB179, Layout::minimumLength, {}, showCells}};
+constexpr Reading kReadings[] = {{0xB179, Layout::minimumLength, {}, showCells, overtakesAlways}};
 constexpr SectionDescription kDescription{"Measured Neighbor Cells", "Measured Neighbor Cells", kReadings};
 
 } // namespace

@@ -43,7 +43,7 @@ void showCells(TableSection& section, const LogPacket& data)
     section.showList(data, Layout::cells, count, kCellRows);
 }
 
-constexpr Reading kReadings[] = {{0xB180, Layout::minimumLength, {}, showCells}};
+constexpr Reading kReadings[] = {{0xB180, Layout::minimumLength, {}, showCells, overtakesAlways}};
 constexpr SectionDescription kDescription{"Neighbor Cells List", "Neighbor Cells List", kReadings};
 
 } // namespace

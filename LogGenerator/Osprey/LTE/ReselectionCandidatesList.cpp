@@ -58,7 +58,7 @@ void showCandidates(TableSection& section, const LogPacket& data)
     });
 }
 
-constexpr Reading kReadings[] = {{0xB186, Layout::minimumLength, {}, showCandidates}};
+constexpr Reading kReadings[] = {{0xB186, Layout::minimumLength, {}, showCandidates, overtakesAlways}};
 constexpr SectionDescription kDescription{"Reselection Candidates List", "Reselection Candidates List",
                                           kReadings};
 
