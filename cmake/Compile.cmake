@@ -58,9 +58,13 @@ function(pelorus_test folder)
   endif()
   add_executable(test_${folder} ${sources})
   target_link_libraries(test_${folder} PRIVATE pelorus_compile GTest::gmock_main ${ARGN})
-  # What is tested is optimised as always; optimising the tests themselves takes most of the time of a build.
+  # What is tested is optimised as always; optimising the tests themselves takes most of the time of a build, and their
+  # headers most of the rest.
   target_compile_options(test_${folder} PRIVATE -O0)
-  set_target_properties(test_${folder} PROPERTIES RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/tests)
+  # To GCC a source that a unity build includes is a header, which should have no unnamed namespace.
+  target_compile_options(test_${folder} PRIVATE $<$<CXX_COMPILER_ID:GNU>:-Wno-subobject-linkage>)
+  set_target_properties(test_${folder} PROPERTIES UNITY_BUILD ON UNITY_BUILD_BATCH_SIZE 12
+                                                  RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/tests)
   gtest_discover_tests(test_${folder} TEST_PREFIX "${folder}." DISCOVERY_TIMEOUT 120)
 endfunction()
 
