@@ -68,3 +68,13 @@ def dlf(messages):
     struct.pack_into("<HH", report, 12, 1, 1)
     struct.pack_into("<I", report, 81, START)
     return bytes(report) + b"".join(data[1:] for data in messages)
+
+
+def recorded(content):
+    """The messages of a pcap file in this machine's byte order."""
+    offset, messages = 24, []
+    while offset < len(content):
+        length = struct.unpack_from("<I", content, offset + 8)[0]
+        messages.append(content[offset + 16:offset + 16 + length])
+        offset += 16 + length
+    return messages

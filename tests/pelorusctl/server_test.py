@@ -7,62 +7,9 @@ import signal
 import struct
 import subprocess
 
-from programs import PELORUSCTL, TELEPHONYD, Scratch, ctl, main
-from recordings import LTE_ANTENNAS, START, lte_cell, message, pcap
-from telephony import LOCAL_PORT, ONE_WAY, REPLY, REQUEST, connect, frame, listen, receive
-
-START_COMMAND = {"SetState": "Streaming", "SetOspreyLogCodes": [0xB0C1, 0xB0C2, 0xB179, 0xB17F, 0xB180, 0xB186],
-                 "SetCtExtraCodes": [0, 1, 2]}
-
-
-class Client:
-    """A monitor's end of a channel, made on the port of that name."""
-
-    def __init__(self, directory, name):
-        listener = listen(directory, name)
-        server = connect(directory, "io.pelorus.TelephonyServer")
-        server.sendall(frame(plistlib.dumps({"CreateLogChannel": name}), REQUEST, 7, 1))
-        payload, message_id, kind, sequence = receive(server)
-        assert (message_id, kind, sequence) == (1, REPLY, 7), (message_id, kind, sequence)
-        answer = plistlib.loads(payload)
-        assert answer["Error"] == 0, answer
-        self.commands = connect(directory, answer["RemotePort"])
-        self.data = listener.accept()[0]
-        self.data.settimeout(10)
-        listener.close()
-        os.unlink(os.path.join(directory, name))
-        server.close()
-
-    def technology(self):
-        self.commands.sendall(frame(plistlib.dumps({"GetTechnology": "GetTechnology"}), REQUEST, 9))
-        payload, _, kind, sequence = receive(self.commands)
-        assert (kind, sequence) == (REPLY, 9)
-        return plistlib.loads(payload)["GetTechnology"]
-
-    def start(self, command=START_COMMAND):
-        self.commands.sendall(frame(plistlib.dumps(command)))
-
-    def messages(self, count):
-        received = []
-        for _ in range(count):
-            payload, message_id, kind, _ = receive(self.data)
-            assert (message_id, kind) == (0, ONE_WAY)
-            received.append(payload)
-        return received
-
-    def close(self):
-        self.data.close()
-        self.commands.close()
-
-
-def recorded(content):
-    """The messages of a pcap file in this machine's byte order."""
-    offset, messages = 24, []
-    while offset < len(content):
-        length = struct.unpack_from("<I", content, offset + 8)[0]
-        messages.append(content[offset + 16:offset + 16 + length])
-        offset += 16 + length
-    return messages
+from programs import PELORUSCTL, TELEPHONYD, ctl, main
+from recordings import LTE_ANTENNAS, START, lte_cell, message, pcap, recorded
+from served import Served
 
 
 def without_time(data):
@@ -70,31 +17,7 @@ def without_time(data):
     return data[:5] + data[13:]
 
 
-class ServerTest(Scratch):
-    def setUp(self):
-        super().setUp()
-        os.mkdir(self.path("ports"), 0o700)
-        self.environment = dict(os.environ, PELORUS_PORT_DIRECTORY=self.path("ports"))
-
-    def serve(self, *arguments):
-        server = subprocess.Popen([TELEPHONYD, *arguments], env=self.environment, stderr=subprocess.PIPE, text=True)
-        self.addCleanup(server.stderr.close)
-        self.addCleanup(server.wait)
-        self.addCleanup(server.kill)
-        self.assertEqual(server.stderr.readline(),
-                         "listening on %s/io.pelorus.TelephonyServer\n" % self.path("ports"))
-        return server
-
-    def end(self, server, number=signal.SIGTERM):
-        server.send_signal(number)
-        self.assertEqual(server.wait(10), 0)
-        self.assertEqual(os.listdir(self.path("ports")), [])
-
-    def client(self, name=LOCAL_PORT):
-        client = Client(self.path("ports"), name)
-        self.addCleanup(client.close)
-        return client
-
+class ServerTest(Served):
     def test_replays_to_several_at_once_and_records(self):
         wanted = [lte_cell(1), b"\x81\x00" + lte_cell(2), LTE_ANTENNAS]
         unwanted = [message(0xB0C0, 38), b"short", message(0xB0C2, 38, log_type=3)]
