@@ -129,7 +129,9 @@ int serve(const Options& options)
     else
         server.acceptClients();
     report(fmt::format("listening on {}", server.path()));
-    return QCoreApplication::exec();
+    const int status = QCoreApplication::exec();
+    const bool recorded = !recorder || recorder->finish(); // why not was said when it happened
+    return recorded ? status : 1;
 }
 
 } // namespace

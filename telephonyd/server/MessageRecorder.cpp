@@ -1,5 +1,7 @@
 #include "telephonyd/server/MessageRecorder.h"
 
+#include <cerrno>
+#include <cstring>
 #include <fmt/format.h>
 
 namespace pelorus {
@@ -55,9 +57,17 @@ void MessageRecorder::flush()
     unflushed = false;
 }
 
+bool MessageRecorder::finish()
+{
+    flush();
+    return !gaveUp;
+}
+
 void MessageRecorder::giveUp()
 {
-    report(fmt::format("{}: cannot be written any more, the recording ends here", path));
+    report(fmt::format("{}: cannot be written any more, the recording ends here: {}", path,
+                       std::strerror(errno)));
+    gaveUp = true;
     writer.reset();
     flushTimer.stop();
 }

@@ -19,6 +19,8 @@ public:
     MessageRecorder& operator=(const MessageRecorder&) = delete;
 
     void record(std::span<const std::byte> message);
+    /// Writes what is left. False when the file does not hold all that it was to hold.
+    bool finish();
 
 private:
     MessageRecorder(std::string path, std::unique_ptr<RecordingWriter> writer, Report report);
@@ -31,6 +33,7 @@ private:
     Report report;
     QTimer flushTimer;
     bool unflushed = false;
+    bool gaveUp = false;
 };
 
 } // namespace pelorus

@@ -127,6 +127,25 @@ TEST_F(ReplayTest, RecordsWhatFitsIntoARecording)
     EXPECT_THAT(lengths, ElementsAre(262144U, 14U));
 }
 
+TEST_F(ReplayTest, RecordingThatCannotGoOnIsSaidOnceAndAtTheEnd)
+{
+    const auto recordTo = [this](const std::string& file) {
+        std::string why;
+        return MessageRecorder::create(
+            file, [this](const std::string& line) { lines.push_back(line); }, why);
+    };
+    const auto full = recordTo("/dev/full");
+    ASSERT_TRUE(full);
+    for (int count = 0; count < 10000; ++count)
+        full->record(packet(1, 9));
+    EXPECT_FALSE(full->finish());
+    EXPECT_THAT(lines, ElementsAre("/dev/full: cannot be written any more, the recording ends here: No space "
+                                   "left on device"));
+    const auto good = recordTo(recordings.filePath("record").toStdString());
+    good->record(packet(1, 9));
+    EXPECT_TRUE(good->finish());
+}
+
 TEST_F(ReplayTest, CannotRecordWhereNoFileCanBe)
 {
     std::string why;
