@@ -7,6 +7,7 @@
 #include <algorithm>
 #include <cerrno>
 #include <cstring>
+#include <fcntl.h>
 #include <fmt/format.h>
 #include <poll.h>
 #include <sys/socket.h>
@@ -17,7 +18,7 @@ namespace pelorus {
 namespace {
 
 /// As much as one wake-up handles, and as much as is held unread.
-constexpr qint64 kReadBuffer = 64 * 1024;
+constexpr std::size_t kReadBuffer = 64 * 1024;
 
 bool isOwnUser(const QLocalSocket& socket, std::string& why)
 {
@@ -91,6 +92,11 @@ void PortConnection::attach()
     on(&QLocalSocket::readyRead, &PortConnection::receive);
     on(&QLocalSocket::bytesWritten, &PortConnection::handleSent);
     on(&QLocalSocket::disconnected, &PortConnection::handlePeerGone);
+    QObject::connect(socket.get(), &QLocalSocket::errorOccurred, socket.get(),
+                     [this](QLocalSocket::LocalSocketError error) {
+                         if (error == QLocalSocket::PeerClosedError)
+                             keepUnread();
+                     });
     receiveLater(); // what came before the signals were connected
 }
 
@@ -130,19 +136,51 @@ void PortConnection::receive()
             break;
         }
         const auto room = reader.room();
-        const auto count =
-            socket->read(reinterpret_cast<char*>(room.data()), static_cast<qint64>(room.size()));
-        if (count <= 0)
+        const std::size_t count = read(room);
+        if (count == 0)
             break;
-        reader.received(static_cast<std::size_t>(count));
+        reader.received(count);
     }
     receiving = false;
     if (open && isHeld() && peerGone && frameCallback)
         end();
 }
 
+std::size_t PortConnection::read(std::span<std::byte> room)
+{
+    if (!kept) {
+        const auto count =
+            socket->read(reinterpret_cast<char*>(room.data()), static_cast<qint64>(room.size()));
+        return count > 0 ? static_cast<std::size_t>(count) : 0;
+    }
+    const auto unread = std::span(*kept).subspan(keptRead);
+    const std::size_t count = std::min(room.size(), unread.size());
+    std::ranges::copy(unread.first(count), room.begin());
+    keptRead += count;
+    return count;
+}
+
+/// A write that fails closes the socket, and with it goes what the peer sent before it went.
+void PortConnection::keepUnread()
+{
+    if (kept || !open)
+        return;
+    const QByteArray buffered = socket->readAll();
+    const auto bytes = std::as_bytes(std::span(buffered.data(), static_cast<std::size_t>(buffered.size())));
+    kept.emplace(bytes.begin(), bytes.end());
+    for (ssize_t count = afterlife ? 1 : 0; count > 0;) {
+        const std::size_t length = kept->size();
+        kept->resize(length + kReadBuffer);
+        count = ::recv(afterlife.get(), kept->data() + length, kReadBuffer, MSG_DONTWAIT);
+        kept->resize(length + static_cast<std::size_t>(std::max<ssize_t>(count, 0)));
+    }
+    afterlife = FileDescriptor();
+}
+
 void PortConnection::handleSent()
 {
+    if (unsent() == 0)
+        afterlife = FileDescriptor();
     if (const auto callback = drainedCallback; open && callback && unsent() <= drainedLevel)
         callAtBoundary(*callback, *this);
     receive(); // it pauses while too much is unsent
@@ -197,6 +235,9 @@ bool PortConnection::send(const Frame& frame)
 
 bool PortConnection::reply(const Frame& request, std::optional<std::span<const std::byte>> payload)
 {
+    // Only who asks is asked: one that goes before its answers may have said more.
+    if (open && !peerGone && !afterlife)
+        afterlife = FileDescriptor(::fcntl(static_cast<int>(socket->socketDescriptor()), F_DUPFD_CLOEXEC, 0));
     return send({.id = request.id,
                  .kind = FrameKind::reply,
                  .sequence = request.sequence,
@@ -223,6 +264,7 @@ void PortConnection::close()
     frameCallback.reset();
     closedCallback.reset();
     drainedCallback.reset();
+    afterlife = FileDescriptor();
     socket->abort();
 }
 
@@ -239,6 +281,17 @@ bool PortConnection::waitForFrames(Clock::time_point deadline)
 {
     const auto self = shared_from_this();
     return open && !peerGone && socket->waitForReadyRead(millisecondsUntil(deadline)) && open && !peerGone;
+}
+
+void PortConnection::deliverArrived()
+{
+    const auto self = shared_from_this();
+    inSignal(&PortConnection::receive);
+    // What a socket holds is less: a peer that goes on sending has no end.
+    constexpr int mostRounds = 64;
+    for (int round = 0; round < mostRounds && open && !peerGone && !receiving; ++round)
+        if (!socket->waitForReadyRead(0))
+            break;
 }
 
 } // namespace pelorus

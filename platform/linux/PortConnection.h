@@ -1,11 +1,13 @@
 #pragma once
 
+#include "platform/linux/FileDescriptor.h"
 #include "platform/linux/FrameReader.h"
 
 #include <chrono>
 #include <functional>
 #include <memory>
 #include <optional>
+#include <vector>
 
 class QLocalSocket;
 
@@ -60,6 +62,8 @@ public:
     bool waitUntilSent(Clock::time_point deadline);
     /// Returns when frames were received, the connection closed (false), or at the deadline (false).
     bool waitForFrames(Clock::time_point deadline);
+    /// Delivers the frames that are there already, for who is about to close.
+    void deliverArrived();
 
     PortConnection(const PortConnection&) = delete;
     PortConnection& operator=(const PortConnection&) = delete;
@@ -74,10 +78,15 @@ private:
     void handleSent();
     void handlePeerGone();
     void receiveLater();
+    std::size_t read(std::span<std::byte> room);
+    void keepUnread();
     void end();
 
     std::unique_ptr<QLocalSocket> socket;
     FrameReader reader;
+    FileDescriptor afterlife; // of the socket, while replies are unsent that may fail to be sent
+    std::optional<std::vector<std::byte>> kept; // once the peer is gone: what it left, and how much was read
+    std::size_t keptRead = 0;
     // Shared, so that one that is running survives being replaced.
     std::shared_ptr<FrameCallback> frameCallback;
     std::shared_ptr<Callback> closedCallback;

@@ -158,6 +158,31 @@ TEST_F(PortConnectionTest, PeerThatReadsNoRepliesIsNotReadFromEither)
     EXPECT_EQ(answered, 1000u);
 }
 
+TEST_F(PortConnectionTest, FramesOfAPeerThatWentBeforeItsAnswersAreDelivered)
+{
+    for (const std::size_t length : {std::size_t{0}, std::size_t{100000}}) { // all sent, and far from it
+        std::vector<std::uint32_t> sequences;
+        const Bytes answer(length);
+        events.clear();
+        connection->onFrame([&](PortConnection& from, const Frame& frame) {
+            sequences.push_back(frame.sequence);
+            from.reply(frame, std::span(answer));
+        });
+        connection->onClosed([&](PortConnection&) { events += "closed"; });
+        std::string requests;
+        for (std::uint32_t sequence = 1; sequence <= 1000; ++sequence)
+            requests += wireFrame(100, 0, 1, sequence, std::string(100, 'q'));
+        ASSERT_TRUE(peer.send(requests)); // more than is read at once
+        peer.close();
+        ASSERT_TRUE(spinUntil([&] { return events == "closed"; }));
+        ASSERT_EQ(sequences.size(), 1000u);
+        EXPECT_TRUE(std::is_sorted(sequences.begin(), sequences.end()));
+        EXPECT_EQ(sequences.back(), 1000u);
+        connection.reset();
+        SetUp();
+    }
+}
+
 TEST_F(PortConnectionTest, SeesTheCloseWithoutTheEventLoop)
 {
     EXPECT_TRUE(connection->isOpen());
