@@ -9,10 +9,11 @@ class LinuxMessagePort : public MessagePort, public std::enable_shared_from_this
 public:
     virtual bool isValid() const = 0;
     void setInvalidationCallback(PortInvalidationCallback callback) { invalidation = std::move(callback); }
-    /// Closes the port and calls the callback, if this is the first time.
+    /// Delivers what arrived, closes the port and calls the callback, if this is the first time.
     void invalidate();
 
 protected:
+    virtual void deliverArrived() {}
     virtual void close() = 0;
     bool isInvalidated() const { return invalidated; }
 

@@ -21,6 +21,14 @@ void LocalPort::startDelivery()
         [this](std::shared_ptr<PortConnection> connection) { addConnection(std::move(connection)); });
 }
 
+/// A sender that is gone may have left messages in the socket.
+void LocalPort::deliverArrived()
+{
+    const auto senders = connections; // one that has ended removes itself
+    for (const auto& connection : senders)
+        connection->deliverArrived();
+}
+
 void LocalPort::close()
 {
     listener.close();

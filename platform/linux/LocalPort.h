@@ -19,6 +19,7 @@ public:
     bool isValid() const override { return !isInvalidated(); }
 
 private:
+    void deliverArrived() override;
     void close() override;
     void addConnection(std::shared_ptr<PortConnection> connection);
     void handle(PortConnection& connection, const Frame& frame);

@@ -52,6 +52,29 @@ TEST_F(LocalPortTest, DeliversOnlyOnceToldTo)
     EXPECT_TRUE(spinUntil([&] { return events == "0:a 1:b "; })) << events;
 }
 
+TEST_F(LocalPortTest, DeliversWhatArrivedBeforeItIsInvalidated)
+{
+    int received = 0;
+    const auto port = make([&](std::int32_t id, std::span<const std::byte>) -> std::optional<Bytes> {
+        received += id == received;
+        return std::nullopt;
+    });
+    platform.deliverOnMainQueue(*port);
+    RawPeer gone = RawPeer::connectTo(path("local"));
+    ASSERT_TRUE(gone.send(oneWay("", 0)));
+    ASSERT_TRUE(spinUntil([&] { return received == 1; }));
+    std::string messages;
+    for (int number = 1; number < 1000; ++number)
+        messages += oneWay(std::string(150, 'x'), number); // more than is read at once
+    ASSERT_TRUE(gone.send(messages));
+    gone.close();
+    platform.setInvalidationCallback(*port, [&](MessagePort&) { events += std::to_string(received); });
+    platform.invalidatePort(*port);
+    EXPECT_EQ(events, "1000");
+    spinOnce();
+    EXPECT_EQ(received, 1000);
+}
+
 TEST_F(LocalPortTest, EveryConnectionCounts)
 {
     const auto port = make(note());
