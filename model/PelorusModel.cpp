@@ -114,6 +114,8 @@ void PelorusModel::configureGenerator()
         systemLog(kLogError, " ***** Reply to GetTechnology had no answer; cannot configure");
         return;
     }
+    if (logGenerator && unrecorded)
+        recordDisplay(); // its raw messages go with it, and no refresh came for them
     // Only an answer replaces the generator: after any earlier failure the one of the last success goes on.
     logGenerator =
         technology.string() ? LogGenerator::generatorFromTechnology(platform, *technology.string()) : nullptr;

@@ -109,6 +109,20 @@ TEST_F(ChannelLoss, StateAndHistorySurvive)
     EXPECT_EQ(model->getSaveContents()->elements.size(), 3U);
 }
 
+TEST_F(ChannelLoss, WhatNoRefreshCameForIsInTheHistory)
+{
+    const Bytes message = simFiles("8949");
+    platform.deliver(message);
+    platform.breakPort(*platform.localPort());
+    ASSERT_TRUE(started());
+    const auto saved = model->getSaveContents();
+    ASSERT_EQ(saved->elements.size(), 2U);
+    EXPECT_EQ(saved->elements[0].dictionary()->at("DisplayState"), Value(makeData(message)));
+
+    platform.breakPort(*platform.localPort());
+    EXPECT_EQ(model->getSaveContents()->elements.size(), 2U) << "only once";
+}
+
 TEST_F(ChannelLoss, NewGeneratorGoesOnInTheSameDisplay)
 {
     platform.deliver(simFiles("8949"));
