@@ -39,9 +39,13 @@ int runApplication()
     setLastWords([&app, &platform](const std::string& exception) {
         if (!app.getModel())
             return;
-        app.getModel()->writeRecoverySnapshot(exception);
-        fmt::print(stderr, "pelorus: ended by {}; what was captured is in {}\n", exception,
-                   platform.snapshotDirectory());
+        std::string why;
+        if (app.getModel()->writeRecoverySnapshot(exception, &why))
+            fmt::print(stderr, "pelorus: ended by {}; what was captured is in {}\n", exception,
+                       platform.snapshotDirectory());
+        else
+            fmt::print(stderr, "pelorus: ended by {}; what was captured cannot be saved: {}\n", exception,
+                       why);
     });
     app.applicationDidFinishLaunching();
     QObject::connect(new QShortcut(QKeySequence::Quit, app.getWindow()), &QShortcut::activated, qApp,

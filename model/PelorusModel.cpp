@@ -263,7 +263,8 @@ std::shared_ptr<Array> PelorusModel::getSaveContents() const
     return logGenerator ? logGenerator->getSaveContentsFromState(*state) : nullptr;
 }
 
-void PelorusModel::writeRecoverySnapshot(std::string_view exceptionName)
+std::optional<std::string> PelorusModel::writeRecoverySnapshot(std::string_view exceptionName,
+                                                               std::string* why)
 {
     if (logGenerator && unrecorded) {
         try {
@@ -279,8 +280,10 @@ void PelorusModel::writeRecoverySnapshot(std::string_view exceptionName)
         if (const Value history = state->at("History"); history.array())
             contents->elements = history.array()->elements;
     }
-    writeSnapshotFile(platform, snapshotFileContent(dateText(platform.now()), contents,
-                                                    "Recovered after " + std::string(exceptionName)));
+    return writeSnapshotFile(platform,
+                             snapshotFileContent(dateText(platform.now()), contents,
+                                                 "Recovered after " + std::string(exceptionName)),
+                             why);
 }
 
 } // namespace pelorus

@@ -51,8 +51,9 @@ public:
     std::shared_ptr<Array> getSaveContents() const;
 
     /// For the program's last moments after an uncaught exception of that name: writes what the history
-    /// holds, and what arrived since, as a snapshot "Recovered after NAME".
-    void writeRecoverySnapshot(std::string_view exceptionName);
+    /// holds, and what arrived since, as a snapshot "Recovered after NAME". Its path, or nothing and `why`.
+    std::optional<std::string> writeRecoverySnapshot(std::string_view exceptionName,
+                                                     std::string* why = nullptr);
 
 private:
     bool createPorts();

@@ -2,6 +2,8 @@
 
 #include "platform/SystemLog.h"
 
+#include <cerrno>
+#include <cstring>
 #include <fmt/format.h>
 
 namespace pelorus {
@@ -17,13 +19,16 @@ Value snapshotFileContent(const std::string& timestamp, const std::shared_ptr<Ar
     return content;
 }
 
-std::optional<std::string> writeSnapshotFile(Platform& platform, const Value& content)
+std::optional<std::string> writeSnapshotFile(Platform& platform, const Value& content, std::string* why)
 {
     const auto seconds = std::chrono::floor<std::chrono::seconds>(platform.now()).time_since_epoch().count();
     const std::string path =
         fmt::format("{}/PelorusSnapshot-{}.pelorus", platform.snapshotDirectory(), seconds);
+    errno = 0;
     if (platform.writePropertyList(content, path))
         return path;
+    if (why)
+        *why = fmt::format("{}: {}", path, errno ? std::strerror(errno) : "cannot be written");
     systemLog(kLogError, "Unable to write snapshot to %s", path);
     return std::nullopt;
 }

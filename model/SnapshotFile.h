@@ -10,7 +10,8 @@ Value snapshotFileContent(const std::string& timestamp, const std::shared_ptr<Ar
                           const std::string& description);
 
 /// Writes the content to the snapshot directory under the name of the current second, and returns its path.
-/// Nothing, and a line in the system log, when that fails.
-std::optional<std::string> writeSnapshotFile(Platform& platform, const Value& content);
+/// Nothing, and a line in the system log, when that fails; `why` is then the path and what is wrong with it.
+std::optional<std::string> writeSnapshotFile(Platform& platform, const Value& content,
+                                             std::string* why = nullptr);
 
 } // namespace pelorus

@@ -43,9 +43,13 @@ public:
         view.setStatus("Connecting...");
         setLastWords([this](const std::string& exception) {
             screen.leave();
-            model.writeRecoverySnapshot(exception);
-            fmt::print(stderr, "pelorusctl: ended by {}; what was captured is in {}\n", exception,
-                       platform.snapshotDirectory());
+            std::string why;
+            if (model.writeRecoverySnapshot(exception, &why))
+                fmt::print(stderr, "pelorusctl: ended by {}; what was captured is in {}\n", exception,
+                           platform.snapshotDirectory());
+            else
+                fmt::print(stderr, "pelorusctl: ended by {}; what was captured cannot be saved: {}\n",
+                           exception, why);
         });
         platform.dispatchAsyncOnMain([this] { model.restartMonitor(); });
     }
@@ -68,7 +72,8 @@ public:
         if (!root)
             return;
         if (!onScreen) {
-            print(options.json ? treeJson(*root, model.lastMessageTime()) : treeText(*root));
+            if (!print(options.json ? treeJson(*root, model.lastMessageTime()) : treeText(*root)))
+                return end(nullptr); // nobody sees what would come
         } else {
             view.setTree(*root);
             if (model.isConnected())

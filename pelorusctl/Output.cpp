@@ -16,10 +16,12 @@ int outputError = 0;
 
 } // namespace
 
-void print(std::string_view text)
+bool print(std::string_view text)
 {
-    if (std::fwrite(text.data(), 1, text.size(), stdout) != text.size() || std::fflush(stdout) != 0)
-        outputError = errno;
+    if (std::fwrite(text.data(), 1, text.size(), stdout) == text.size() && std::fflush(stdout) == 0)
+        return true;
+    outputError = errno;
+    return false;
 }
 
 int finishOutput(int status)

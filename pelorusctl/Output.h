@@ -8,8 +8,8 @@ namespace pelorus {
 /// Exit statuses of the program.
 enum ExitStatus : int { kSuccess = 0, kUnreadable = 1, kWrongUsage = 2 };
 
-/// Writes to standard output at once. What cannot be written is reported by finishOutput().
-void print(std::string_view text);
+/// Writes to standard output at once. False when it does not take everything, which finishOutput() reports.
+bool print(std::string_view text);
 /// `status`, or 1 and a line on standard error when standard output did not take everything.
 int finishOutput(int status);
 

@@ -73,7 +73,9 @@ TEST_F(WrittenSnapshot, ReplacesAnotherOfTheSameSecond)
 TEST_F(WrittenSnapshot, SaysWhenItCannotBeWritten)
 {
     platform.writesFail = true;
-    EXPECT_FALSE(writeSnapshotFile(platform, saying("one")));
+    std::string why;
+    EXPECT_FALSE(writeSnapshotFile(platform, saying("one"), &why));
+    EXPECT_EQ(why, "/crash-reports/PelorusSnapshot-1336123800.pelorus: cannot be written");
     EXPECT_THAT(
         log.take(),
         ElementsAre("<3>Unable to write snapshot to /crash-reports/PelorusSnapshot-1336123800.pelorus"));
