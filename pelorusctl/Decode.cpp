@@ -3,7 +3,9 @@
 #include "pelorusctl/OfflineMonitor.h"
 #include "pelorusctl/Output.h"
 #include "pelorusctl/TreeOutput.h"
+#include "platform/PropertyList.h"
 #include "platform/linux/FileLogSink.h"
+#include "platform/linux/Files.h"
 #include "platform/linux/LinuxPlatform.h"
 
 #include <cerrno>
@@ -67,7 +69,8 @@ int decode(const DecodeOptions& options)
         const Value content =
             snapshotFileContent(dateText(platform.now()), monitor.saveContents(), options.description);
         errno = 0;
-        if (!platform.writePropertyList(content, options.save))
+        const auto bytes = serializePropertyList(content);
+        if (!bytes || !replaceWholeFile(options.save, *bytes))
             status = fail(options.save, errno ? std::strerror(errno) : "cannot be written");
     }
     return finishOutput(status);

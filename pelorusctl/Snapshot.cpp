@@ -9,7 +9,6 @@
 #include <cerrno>
 #include <cstring>
 #include <fmt/format.h>
-#include <fstream>
 #include <nlohmann/json.hpp>
 #include <vector>
 
@@ -103,10 +102,9 @@ int extract(const Data& dlf, const SnapshotOptions& options)
 {
     if (!dlf)
         return fail(options.snapshot, "carries no DLF file");
-    std::ofstream file(options.extractDlf, std::ofstream::binary | std::ofstream::trunc);
-    file.write(reinterpret_cast<const char*>(dlf->data()), static_cast<std::streamsize>(dlf->size()));
-    file.close();
-    return file ? kSuccess : fail(options.extractDlf, std::strerror(errno));
+    return replaceWholeFile(options.extractDlf, std::as_bytes(std::span(*dlf)))
+               ? kSuccess
+               : fail(options.extractDlf, std::strerror(errno));
 }
 
 } // namespace

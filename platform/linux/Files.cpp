@@ -4,10 +4,27 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <cstdlib>
 #include <fcntl.h>
+#include <filesystem>
 #include <sys/stat.h>
 
 namespace pelorus {
+
+namespace {
+
+/// A full disk may show at the end only.
+bool finish(FileDescriptor& file, std::span<const std::byte> bytes)
+{
+    const bool written = writeAll(file.get(), bytes);
+    const int error = errno;
+    const bool closed = file.close();
+    if (!written)
+        errno = error;
+    return written && closed;
+}
+
+} // namespace
 
 bool writeAll(int descriptor, std::span<const std::byte> bytes)
 {
@@ -55,8 +72,36 @@ bool writeWholeFile(const std::string& path, std::span<const std::byte> bytes)
     FileDescriptor file(::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0666));
     if (!file)
         return false;
-    const bool written = writeAll(file.get(), bytes);
-    return file.close() && written; // a full disk may show at the end only
+    if (finish(file, bytes))
+        return true;
+    const int error = errno;
+    struct stat status = {};
+    if (::lstat(path.c_str(), &status) == 0 && S_ISREG(status.st_mode))
+        ::unlink(path.c_str());
+    errno = error;
+    return false;
+}
+
+bool replaceWholeFile(const std::string& path, std::span<const std::byte> bytes)
+{
+    struct stat old = {};
+    if (::stat(path.c_str(), &old) != 0 || !S_ISREG(old.st_mode))
+        return writeWholeFile(path, bytes); // there is nothing to keep
+    if (::access(path.c_str(), W_OK) != 0)
+        return false;
+    const std::filesystem::path target = std::filesystem::canonical(path); // links stay links
+    std::string temporary = target.parent_path() / ".pelorus-XXXXXX";
+    FileDescriptor file(::mkostemp(temporary.data(), O_CLOEXEC));
+    if (!file)
+        return false;
+    const bool ownerKept = ::fchown(file.get(), old.st_uid, old.st_gid) == 0;
+    if ((ownerKept || errno == EPERM) && ::fchmod(file.get(), old.st_mode & 07777) == 0 &&
+        finish(file, bytes) && ::rename(temporary.c_str(), target.c_str()) == 0)
+        return true;
+    const int error = errno;
+    ::unlink(temporary.c_str());
+    errno = error;
+    return false;
 }
 
 } // namespace pelorus

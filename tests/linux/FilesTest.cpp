@@ -1,11 +1,17 @@
 #include "platform/linux/LinuxPlatform.h"
 #include "platform/linux/SnapshotDirectory.h"
 
+#include "platform/linux/Files.h"
 #include "tests/linux/PortFixture.h"
 
+#include <QDir>
 #include <QFile>
+#include <array>
+#include <cerrno>
+#include <csignal>
 #include <ctime>
 #include <fcntl.h>
+#include <sys/resource.h>
 #include <sys/stat.h>
 
 namespace pelorus {
@@ -13,6 +19,29 @@ namespace pelorus {
 using test::EnvironmentVariable;
 
 namespace {
+
+/// No file gets longer, as on a full disk.
+class FileSizeLimit {
+public:
+    explicit FileSizeLimit(rlim_t bytes)
+    {
+        ::getrlimit(RLIMIT_FSIZE, &before);
+        handler = std::signal(SIGXFSZ, SIG_IGN);
+        const rlimit limit = {bytes, before.rlim_max};
+        ::setrlimit(RLIMIT_FSIZE, &limit);
+    }
+    ~FileSizeLimit()
+    {
+        ::setrlimit(RLIMIT_FSIZE, &before);
+        std::signal(SIGXFSZ, handler);
+    }
+    FileSizeLimit(const FileSizeLimit&) = delete;
+    FileSizeLimit& operator=(const FileSizeLimit&) = delete;
+
+private:
+    rlimit before = {};
+    void (*handler)(int) = nullptr;
+};
 
 class FilesTest : public testing::Test {
 protected:
@@ -59,6 +88,55 @@ TEST_F(FilesTest, FailureToWriteIsSaid)
     EXPECT_FALSE(platform.writePropertyList(value, "/dev/full"));
     EXPECT_FALSE(platform.writePropertyList(Value(), below("nil")));
     EXPECT_FALSE(platform.fileExists(below("nil")));
+}
+
+TEST_F(FilesTest, HalfAFileIsNotLeft)
+{
+    const FileSizeLimit limit(1000);
+    const Bytes tooLong(5000);
+    errno = 0;
+    EXPECT_FALSE(writeWholeFile(below("new"), tooLong));
+    EXPECT_EQ(errno, EFBIG);
+    EXPECT_FALSE(platform.fileExists(below("new")));
+}
+
+TEST_F(FilesTest, ReplacementIsWholeOrNotAtAll)
+{
+    const auto replace = [this](const std::string& name, std::string_view text) {
+        return replaceWholeFile(below(name), std::as_bytes(std::span(text)));
+    };
+    EXPECT_TRUE(replace("file", "first")) << "there need not be an old one";
+    ASSERT_EQ(::chmod(below("file").c_str(), 0640), 0);
+    ASSERT_EQ(::symlink("file", below("link").c_str()), 0);
+    EXPECT_TRUE(replace("link", "second"));
+    EXPECT_EQ(contentOf("file"), "second");
+    struct stat status = {};
+    ASSERT_EQ(::lstat(below("link").c_str(), &status), 0);
+    EXPECT_TRUE(S_ISLNK(status.st_mode));
+    ASSERT_EQ(::stat(below("file").c_str(), &status), 0);
+    EXPECT_EQ(status.st_mode & 07777, 0640u);
+    {
+        const FileSizeLimit limit(1000);
+        errno = 0;
+        EXPECT_FALSE(replace("file", std::string(5000, 'x')));
+        EXPECT_EQ(errno, EFBIG);
+    }
+    EXPECT_EQ(contentOf("file"), "second");
+    EXPECT_EQ(QDir(base.path()).entryList(QDir::Files | QDir::Hidden), QStringList({"file", "link"}));
+}
+
+TEST_F(FilesTest, WhatIsNoRegularFileIsNotReplaced)
+{
+    ASSERT_EQ(::mkfifo(below("pipe").c_str(), 0600), 0);
+    const FileDescriptor reader(::open(below("pipe").c_str(), O_RDONLY | O_NONBLOCK));
+    EXPECT_TRUE(replaceWholeFile(below("pipe"), std::as_bytes(std::span("text", 4))));
+    std::array<char, 5> read{};
+    EXPECT_EQ(::read(reader.get(), read.data(), read.size()), 4);
+    EXPECT_STREQ(read.data(), "text");
+    errno = 0;
+    EXPECT_FALSE(replaceWholeFile("/dev/full", std::as_bytes(std::span("text", 4))));
+    EXPECT_EQ(errno, ENOSPC);
+    EXPECT_TRUE(platform.fileExists("/dev/full"));
 }
 
 TEST_F(FilesTest, ReadsWholeFiles)
