@@ -34,6 +34,34 @@ public:
     ChosenSink& operator=(const ChosenSink&) = delete;
 };
 
+int decodeRecording(RecordingReader& recording, const DecodeOptions& options)
+{
+    LinuxPlatform platform(options.resources);
+    OfflineMonitor monitor(LogGenerator::generatorFromTechnology(platform, options.technology),
+                           interval(options),
+                           [&options](const PelorusModelNode& root, std::optional<RecordedTime> lastMessage) {
+                               print(options.json ? treeJson(root, lastMessage) : treeText(root));
+                           });
+    RecordedMessage message;
+    RecordingReader::Next next{};
+    while ((next = recording.next(message)) == RecordingReader::Next::message)
+        monitor.receive(message);
+    monitor.finish(); // of a broken recording, what came before the break is shown and saved all the same
+
+    int status = kSuccess;
+    if (next == RecordingReader::Next::failed)
+        status = fail(options.recording, recording.why());
+    if (!options.save.empty()) {
+        const Value content =
+            snapshotFileContent(dateText(platform.now()), monitor.saveContents(), options.description);
+        errno = 0;
+        const auto bytes = serializePropertyList(content);
+        if (!bytes || !replaceWholeFile(options.save, *bytes))
+            status = fail(options.save, errno ? std::strerror(errno) : "cannot be written");
+    }
+    return status;
+}
+
 } // namespace
 
 int decode(const DecodeOptions& options)
@@ -50,29 +78,9 @@ int decode(const DecodeOptions& options)
     if (!options.systemLog.empty() && !(log = FileLogSink::open(options.systemLog, why)))
         return fail(options.systemLog, why);
     const ChosenSink chosenSink(log.get());
-    LinuxPlatform platform(options.resources);
-    OfflineMonitor monitor(LogGenerator::generatorFromTechnology(platform, options.technology),
-                           interval(options),
-                           [&options](const PelorusModelNode& root, std::optional<RecordedTime> lastMessage) {
-                               print(options.json ? treeJson(root, lastMessage) : treeText(root));
-                           });
-    RecordedMessage message;
-    RecordingReader::Next next{};
-    while ((next = recording->next(message)) == RecordingReader::Next::message)
-        monitor.receive(message);
-    monitor.finish(); // of a broken recording, what came before the break is shown and saved all the same
-
-    int status = kSuccess;
-    if (next == RecordingReader::Next::failed)
-        status = fail(options.recording, recording->why());
-    if (!options.save.empty()) {
-        const Value content =
-            snapshotFileContent(dateText(platform.now()), monitor.saveContents(), options.description);
-        errno = 0;
-        const auto bytes = serializePropertyList(content);
-        if (!bytes || !replaceWholeFile(options.save, *bytes))
-            status = fail(options.save, errno ? std::strerror(errno) : "cannot be written");
-    }
+    int status = decodeRecording(*recording, options);
+    if (log && log->error())
+        status = fail(options.systemLog, std::strerror(log->error()));
     return finishOutput(status);
 }
 

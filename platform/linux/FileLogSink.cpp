@@ -29,7 +29,8 @@ void FileLogSink::write(int priority, std::string_view text)
         text.remove_suffix(1);
     line.clear();
     fmt::format_to(std::back_inserter(line), "<{}>{}\n", priority, text);
-    writeAll(file.get(), std::as_bytes(std::span(line)));
+    if (!writeAll(file.get(), std::as_bytes(std::span(line))) && firstError == 0)
+        firstError = errno;
 }
 
 } // namespace pelorus

@@ -16,12 +16,15 @@ public:
     /// then the reason, without the file's name.
     static std::unique_ptr<FileLogSink> open(const std::string& path, std::string& why);
     void write(int priority, std::string_view text) override;
+    /// What kept an entry out of the file (errno, the first one), or 0.
+    int error() const { return firstError; }
 
 private:
     explicit FileLogSink(FileDescriptor file) : file(std::move(file)) {}
 
     FileDescriptor file;
     std::string line; // reused
+    int firstError = 0;
 };
 
 } // namespace pelorus

@@ -2,6 +2,7 @@
 
 #include <QFile>
 #include <QTemporaryDir>
+#include <cerrno>
 #include <gtest/gtest.h>
 
 namespace pelorus {
@@ -36,6 +37,15 @@ TEST_F(FileLogSinkTest, WritesPriorityTextAndExactlyOneLineFeed)
     sink->write(5, "");
     sink->write(4, "in\nside\n");
     EXPECT_EQ(content(), "<3>plain\n<16> blanks stay \n<4>one feed\n<4>many feeds\n<5>\n<4>in\nside\n");
+}
+
+TEST_F(FileLogSinkTest, KnowsWhatKeptAnEntryOut)
+{
+    const auto sink = FileLogSink::open("/dev/full", why);
+    ASSERT_TRUE(sink);
+    EXPECT_EQ(sink->error(), 0);
+    sink->write(3, "lost");
+    EXPECT_EQ(sink->error(), ENOSPC);
 }
 
 TEST_F(FileLogSinkTest, EmptiesAnOldFile)
