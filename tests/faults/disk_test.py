@@ -9,8 +9,8 @@ import signal
 import subprocess
 import unittest
 
-from faults import DEADLY, Live, numbered, saved
-from programs import PELORUSCTL, TELEPHONYD, ctl, main
+from faults import DEADLY, Live, main_at_once, numbered, saved
+from programs import PELORUSCTL, TELEPHONYD, ctl
 from recordings import START, lte_cell, pcap, recorded
 from served import Served
 
@@ -244,4 +244,4 @@ class RecordingTest(Disk):
 
 
 if __name__ == "__main__":
-    main()
+    main_at_once()

@@ -11,10 +11,11 @@ import subprocess
 import sys
 import threading
 import time
+import unittest
 
 sys.path.insert(0, str(pathlib.Path(__file__).resolve().parent.parent / "pelorusctl"))
 
-from programs import PELORUSCTL, leaves  # noqa: E402
+from programs import PELORUSCTL, TELEPHONYD, leaves, main  # noqa: E402
 from recordings import START, internal, lte_cell, pcap  # noqa: E402
 from stage import PCI  # noqa: E402
 
@@ -130,6 +131,25 @@ class Live:
         self.reader.join(PATIENCE)
         self.process.stdout.close()
         self.process.stderr.close()
+
+
+def main_at_once():
+    """Runs each test of the script in a process of its own, all at once: they mostly wait. With further arguments, as
+    usual."""
+    if len(sys.argv) > 3:
+        main()
+
+    def run(test):
+        return subprocess.run([sys.executable, "-B", sys.argv[0], PELORUSCTL, TELEPHONYD, "-v", test],
+                              stdin=subprocess.DEVNULL, capture_output=True, text=True, check=False)
+
+    classes = unittest.defaultTestLoader.loadTestsFromModule(sys.modules["__main__"])
+    names = ["%s.%s" % (type(test).__name__, test._testMethodName) for tests in classes for test in tests]
+    with concurrent.futures.ThreadPoolExecutor(len(names)) as pool:
+        runs_ = list(pool.map(run, names))
+    for done in runs_:
+        sys.stderr.write(done.stderr if done.returncode else done.stderr.splitlines(True)[0])
+    sys.exit(any(done.returncode for done in runs_) or not names)
 
 
 class Scenarios:
