@@ -89,18 +89,25 @@ bool replaceWholeFile(const std::string& path, std::span<const std::byte> bytes)
         return writeWholeFile(path, bytes); // there is nothing to keep
     if (::access(path.c_str(), W_OK) != 0)
         return false;
-    const std::filesystem::path target = std::filesystem::canonical(path); // links stay links
+    std::error_code error;
+    const std::filesystem::path target = std::filesystem::canonical(path, error); // links stay links
+    if (error) {
+        errno = error.value();
+        return false;
+    }
     std::string temporary = target.parent_path() / ".pelorus-XXXXXX";
     FileDescriptor file(::mkostemp(temporary.data(), O_CLOEXEC));
+    if (!file && errno == EACCES)
+        return writeWholeFile(path, bytes); // the file may be written, but no other beside it
     if (!file)
         return false;
     const bool ownerKept = ::fchown(file.get(), old.st_uid, old.st_gid) == 0;
     if ((ownerKept || errno == EPERM) && ::fchmod(file.get(), old.st_mode & 07777) == 0 &&
         finish(file, bytes) && ::rename(temporary.c_str(), target.c_str()) == 0)
         return true;
-    const int error = errno;
+    const int reason = errno;
     ::unlink(temporary.c_str());
-    errno = error;
+    errno = reason;
     return false;
 }
 
