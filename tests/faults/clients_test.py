@@ -141,7 +141,7 @@ class ManyClientsTest(Clients):
 
 
 class ClientThatDoesNotReadTest(Clients):
-    ROUNDS = 20  # of the recording, for those who read
+    ROUNDS = 8  # of the recording, for those who read
 
     def test_costs_the_others_nothing(self):
         server = self.replay("--loop")

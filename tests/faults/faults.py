@@ -1,6 +1,7 @@
 """What the tests of faults have in common: numbered messages, monitors that are watched, and memory that is measured."""
 
 import concurrent.futures
+import functools
 import glob
 import json
 import os
@@ -36,9 +37,12 @@ def wait_for(what, condition, patience=PATIENCE):
         time.sleep(0.02)
 
 
+cell_of = functools.lru_cache(lte_cell)
+
+
 def numbered(number):
     """A message that carries its number as the time stamp, and shows how many millions that is."""
-    data = bytearray(lte_cell(number // MILLION))
+    data = bytearray(cell_of(number // MILLION))
     struct.pack_into("<Q", data, 5, number)
     return bytes(data)
 

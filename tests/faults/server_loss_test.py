@@ -53,7 +53,7 @@ class Place:
 
     def stream(self, first):
         """A server that streams numbered messages, for longer than any scenario takes."""
-        return self.serve(numbered_recording(first, 40 * RATE, RATE))
+        return self.serve(numbered_recording(first, 25 * RATE, RATE))
 
     def last_words(self, first, count):
         """A server that streams so many messages, and then the one that ends the monitor."""
