@@ -7,7 +7,6 @@ import os
 import resource
 import signal
 import subprocess
-import unittest
 
 from faults import DEADLY, Live, main_at_once, numbered, saved
 from programs import PELORUSCTL, TELEPHONYD, ctl

@@ -4,7 +4,6 @@ of what reached it. The scenarios wait for time-outs, so all run at once."""
 
 import contextlib
 import os
-import select
 import signal
 import subprocess
 import tempfile

@@ -10,6 +10,7 @@ import subprocess
 from programs import PELORUSCTL, TELEPHONYD, ctl, main
 from recordings import LTE_ANTENNAS, START, lte_cell, message, pcap, recorded
 from served import Served
+from telephony import REQUEST, connect, frame, receive
 
 
 def without_time(data):
