@@ -1,73 +1,36 @@
-// Messages from another process over the log channel's socket to the model, with and without decoding.
+// Messages from another process over the log channel's socket to the model, with and without decoding, beside
+// what a bare socket and decoding in memory take. The comparisons are meant to run on one core, the sender
+// and the receiver together: then a rate is the work of both.
 
-#include "bench/MessageStream.h"
+#include "bench/FrameSender.h"
+#include "bench/Paired.h"
+#include "bench/RawReceiver.h"
 #include "model/PelorusModel.h"
 #include "platform/linux/LinuxPlatform.h"
 
 #include <QCoreApplication>
 #include <QEventLoop>
-#include <benchmark/benchmark.h>
-#include <cstdio>
 #include <cstdlib>
-#include <fcntl.h>
 #include <filesystem>
-#include <sys/socket.h>
-#include <sys/un.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
 namespace {
 
 using namespace pelorus;
 
 constexpr std::size_t kMessages = 200'000;
+constexpr std::size_t kAllAtOnce = kMessages;
 
-std::vector<std::byte> framed(const bench::MessageStream& stream)
+std::string socketPath(const char* name)
 {
-    std::vector<std::byte> frames;
-    for (std::size_t index = 0; index < stream.size(); ++index) {
-        const auto message = stream[index];
-        std::byte header[16] = {};
-        for (std::size_t place = 0; place < 4; ++place)
-            header[place] = static_cast<std::byte>(message.size() >> (8 * place));
-        frames.insert(frames.end(), header, header + sizeof header);
-        frames.insert(frames.end(), message.begin(), message.end());
-    }
-    return frames;
+    return std::string(std::getenv("PELORUS_PORT_DIRECTORY")) + '/' + name;
 }
 
-/// A process that connects to the port and writes everything as fast as it is taken.
-pid_t startSender(const std::string& path, const std::vector<std::byte>& frames)
-{
-    const pid_t child = fork();
-    if (child != 0)
-        return child;
-    sockaddr_un address{};
-    address.sun_family = AF_UNIX;
-    std::snprintf(address.sun_path, sizeof address.sun_path, "%s", path.c_str());
-    const int descriptor = socket(AF_UNIX, SOCK_STREAM, 0);
-    if (connect(descriptor, reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0)
-        _exit(1);
-    for (std::size_t sent = 0; sent < frames.size();) {
-        const ssize_t count = write(descriptor, frames.data() + sent, frames.size() - sent);
-        if (count <= 0)
-            _exit(1);
-        sent += static_cast<std::size_t>(count);
-    }
-    char none = 0;
-    [[maybe_unused]] const ssize_t closed = read(descriptor, &none, 1); // until the receiver is done
-    _exit(0);
-}
-
-void receive(benchmark::State& run)
-{
-    const bench::MessageStream stream("Osprey LTE", kMessages);
-    const auto frames = framed(stream);
-    LinuxPlatform platform(PELORUS_SOURCE_DIR "/resources");
-    const auto generator = LogGenerator::generatorFromTechnology(platform, "Osprey LTE");
-    State state;
-    const bool decodes = run.range(0) != 0;
-    for ([[maybe_unused]] auto _ : run) {
+/// What a handset sends, and both ways of taking it.
+class Receiver {
+public:
+    /// Over a local port, from a process that writes so many frames at once. False when some were lost.
+    bool receive(std::size_t framesPerWrite, bool decodes)
+    {
         std::size_t received = 0;
         auto local =
             platform.createLocalMessagePort("bench", [&](std::int32_t, std::span<const std::byte> data) {
@@ -77,22 +40,76 @@ void receive(benchmark::State& run)
                 return std::optional<Bytes>();
             });
         platform.deliverOnMainQueue(*local.port);
-        const pid_t sender =
-            startSender(std::string(std::getenv("PELORUS_PORT_DIRECTORY")) + "/bench", frames);
+        const bench::FrameSender sender(socketPath("bench"), frames, framesPerWrite);
         while (received < stream.size())
             QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
         platform.invalidatePort(*local.port);
-        int status = 0;
-        waitpid(sender, &status, 0);
-        if (status != 0)
-            run.SkipWithError("the sender failed");
+        generator->generateLogUsingState(state);
+        return sender.succeeded();
+    }
+
+    bool receiveRaw()
+    {
+        const bench::FrameSender sender(socketPath("raw"), frames, 1);
+        const bool all = raw.receive(stream.size()) == stream.size();
+        return sender.succeeded() && all;
+    }
+
+    void decodeInMemory()
+    {
+        for (std::size_t index = 0; index < stream.size(); ++index)
+            generator->updateState(state, stream[index]);
         generator->generateLogUsingState(state);
     }
+
+    const bench::MessageStream stream = bench::MessageStream("Osprey LTE", kMessages);
+
+private:
+    bench::Frames frames = bench::Frames(stream);
+    bench::RawReceiver raw = bench::RawReceiver(socketPath("raw"));
+    LinuxPlatform platform = LinuxPlatform(PELORUS_SOURCE_DIR "/resources");
+    std::unique_ptr<LogGenerator> generator = LogGenerator::generatorFromTechnology(platform, "Osprey LTE");
+    State state;
+};
+
+void receive(benchmark::State& run)
+{
+    Receiver receiver;
+    const bool decodes = run.range(0) != 0;
+    for ([[maybe_unused]] auto _ : run)
+        if (!receiver.receive(kAllAtOnce, decodes))
+            run.SkipWithError("the sender failed");
     run.SetLabel(decodes ? "decoded" : "counted");
-    run.SetItemsProcessed(run.iterations() * static_cast<std::int64_t>(stream.size()));
-    run.SetBytesProcessed(run.iterations() * static_cast<std::int64_t>(stream.byteCount()));
+    run.SetItemsProcessed(run.iterations() * static_cast<std::int64_t>(receiver.stream.size()));
+    run.SetBytesProcessed(run.iterations() * static_cast<std::int64_t>(receiver.stream.byteCount()));
 }
 BENCHMARK(receive)->DenseRange(0, 1)->UseRealTime()->Unit(benchmark::kMillisecond);
+
+/// A frame a write: the port, counting, against read(2), counting.
+void framesBesideRaw(benchmark::State& run)
+{
+    Receiver receiver;
+    bool all = true;
+    bench::compare(
+        run, CLOCK_MONOTONIC, receiver.stream.size(), [&] { all = receiver.receive(1, false) && all; },
+        [&] { all = receiver.receiveRaw() && all; });
+    if (!all)
+        run.SkipWithError("frames were lost");
+}
+BENCHMARK(framesBesideRaw)->UseManualTime()->Iterations(15)->Unit(benchmark::kMillisecond);
+
+/// 64 frames a write, decoded, against the same messages decoded in memory.
+void batchesBesideMemory(benchmark::State& run)
+{
+    Receiver receiver;
+    bool all = true;
+    bench::compare(
+        run, CLOCK_MONOTONIC, receiver.stream.size(), [&] { all = receiver.receive(64, true) && all; },
+        [&] { receiver.decodeInMemory(); });
+    if (!all)
+        run.SkipWithError("frames were lost");
+}
+BENCHMARK(batchesBesideMemory)->UseManualTime()->Iterations(15)->Unit(benchmark::kMillisecond);
 
 } // namespace
 

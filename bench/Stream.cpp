@@ -2,10 +2,10 @@
 // walking the framed messages takes.
 
 #include "LogGenerator/LogGenerator.h"
-#include "bench/MessageStream.h"
+#include "bench/Dispatch.h"
+#include "bench/Paired.h"
 #include "platform/scripted/ScriptedPlatform.h"
 
-#include <benchmark/benchmark.h>
 #include <map>
 
 namespace {
@@ -32,18 +32,35 @@ void count(benchmark::State& run, const bench::MessageStream& stream)
     run.SetBytesProcessed(run.iterations() * static_cast<std::int64_t>(stream.byteCount()));
 }
 
+/// The messages of a stream, through a generator of their technology.
+class Decoder {
+public:
+    Decoder(const bench::MessageStream& messages, const char* technology) : stream(messages)
+    {
+        platform.useResourceDirectory(PELORUS_SOURCE_DIR "/resources");
+        generator = LogGenerator::generatorFromTechnology(platform, technology);
+    }
+
+    void decode()
+    {
+        for (std::size_t index = 0; index < stream.size(); ++index)
+            generator->updateState(state, stream[index]);
+        generator->generateLogUsingState(state);
+    }
+
+private:
+    const bench::MessageStream& stream;
+    ScriptedPlatform platform;
+    std::unique_ptr<LogGenerator> generator;
+    State state;
+};
+
 void walk(benchmark::State& run)
 {
     const bench::MessageStream& stream = streamOf(run.range(0));
-    for ([[maybe_unused]] auto _ : run) {
-        std::size_t codes = 0;
-        for (std::span<const std::byte> rest = stream.bytes(); !rest.empty();) {
-            codes += std::to_integer<std::size_t>(rest[3]) | std::to_integer<std::size_t>(rest[4]) << 8;
-            rest = rest.subspan(
-                1 + (std::to_integer<std::size_t>(rest[1]) | std::to_integer<std::size_t>(rest[2]) << 8));
-        }
-        benchmark::DoNotOptimize(codes);
-    }
+    const bench::Dispatch dispatch(stream);
+    for ([[maybe_unused]] auto _ : run)
+        benchmark::DoNotOptimize(dispatch.walk(stream.bytes()));
     count(run, stream);
 }
 BENCHMARK(walk)->DenseRange(0, 3);
@@ -51,18 +68,24 @@ BENCHMARK(walk)->DenseRange(0, 3);
 void decode(benchmark::State& run)
 {
     const bench::MessageStream& stream = streamOf(run.range(0));
-    ScriptedPlatform platform;
-    platform.useResourceDirectory(PELORUS_SOURCE_DIR "/resources");
-    const auto generator = LogGenerator::generatorFromTechnology(platform, kTechnologies[run.range(0)]);
-    State state;
-    for ([[maybe_unused]] auto _ : run) {
-        for (std::size_t index = 0; index < stream.size(); ++index)
-            generator->updateState(state, stream[index]);
-        generator->generateLogUsingState(state);
-    }
+    Decoder decoder(stream, kTechnologies[run.range(0)]);
+    for ([[maybe_unused]] auto _ : run)
+        decoder.decode();
     count(run, stream);
 }
 BENCHMARK(decode)->DenseRange(0, 3)->Unit(benchmark::kMillisecond);
+
+void decodeBesideWalk(benchmark::State& run)
+{
+    const bench::MessageStream& stream = streamOf(run.range(0));
+    const bench::Dispatch dispatch(stream);
+    Decoder decoder(stream, kTechnologies[run.range(0)]);
+    bench::compare(
+        run, CLOCK_THREAD_CPUTIME_ID, stream.size(), [&] { decoder.decode(); },
+        [&] { benchmark::DoNotOptimize(dispatch.walk(stream.bytes())); });
+    run.SetLabel(kTechnologies[run.range(0)]);
+}
+BENCHMARK(decodeBesideWalk)->DenseRange(0, 3)->UseManualTime()->Iterations(25)->Unit(benchmark::kMillisecond);
 
 } // namespace
 
