@@ -1,9 +1,13 @@
 #pragma once
 
 #include "bench/MessageStream.h"
+#include "bench/Paired.h"
 #include "platform/linux/Frame.h"
 
+#include <algorithm>
+#include <csignal>
 #include <cstdio>
+#include <stdexcept>
 #include <string>
 #include <sys/socket.h>
 #include <sys/un.h>
@@ -47,45 +51,96 @@ private:
     std::vector<std::size_t> ends;
 };
 
-/// A process that connects to a socket and writes all frames, so many a write, as fast as they are taken.
+/// A process that, whenever it is told to, connects to a socket and writes all frames as fast as they are
+/// taken. It lives as long as this object: a new one for each round would have the receiver's memory copied,
+/// page by page, while the receiver is measured.
 class FrameSender {
 public:
-    FrameSender(const std::string& path, const Frames& frames, std::size_t framesPerWrite) : child(fork())
+    explicit FrameSender(const Frames& frames)
     {
-        if (child != 0)
-            return;
-        const sockaddr_un address = addressOf(path);
-        const int descriptor = socket(AF_UNIX, SOCK_STREAM, 0);
-        if (connect(descriptor, reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0)
-            _exit(1);
-        for (std::size_t first = 0; first < frames.size(); first += framesPerWrite)
-            send(descriptor, frames.bytes(first, framesPerWrite));
-        char none = 0;
-        [[maybe_unused]] const ssize_t closed = read(descriptor, &none, 1); // until the receiver is done
-        _exit(0);
+        int ends[2] = {};
+        if (socketpair(AF_UNIX, SOCK_STREAM, 0, ends) != 0)
+            throw std::runtime_error("no socket for orders");
+        child = fork();
+        orders = ends[child == 0 ? 1 : 0];
+        close(ends[child == 0 ? 0 : 1]);
+        if (child == 0)
+            serve(frames);
+    }
+    ~FrameSender()
+    {
+        close(orders); // which ends it
+        waitpid(child, nullptr, 0);
     }
     FrameSender(const FrameSender&) = delete;
     FrameSender& operator=(const FrameSender&) = delete;
 
-    /// Waits for its end, which comes when the receiver closes. False when not everything was taken.
-    bool succeeded() const
+    /// Sends once, so many frames a write.
+    void start(const std::string& path, std::size_t framesPerWrite)
     {
-        int status = 1;
-        return child > 0 && waitpid(child, &status, 0) == child && status == 0;
+        Order order{framesPerWrite, addressOf(path)};
+        if (write(orders, &order, sizeof order) != sizeof order)
+            throw std::runtime_error("the sender is gone");
+    }
+    /// Waits until the receiver has closed and the sender noticed. False when not everything was taken.
+    bool succeeded()
+    {
+        bool sent = false;
+        return read(orders, &sent, sizeof sent) == sizeof sent && sent;
+    }
+
+    /// Of its processor time.
+    double seconds() const
+    {
+        clockid_t clock{};
+        clock_getcpuclockid(child, &clock);
+        return secondsOf(clock);
     }
 
 private:
-    static void send(int descriptor, std::span<const std::byte> bytes)
+    struct Order {
+        std::size_t framesPerWrite;
+        sockaddr_un address;
+    };
+
+    [[noreturn]] void serve(const Frames& frames) const
+    {
+        signal(SIGPIPE, SIG_IGN);
+        Order order{};
+        while (read(orders, &order, sizeof order) == sizeof order) {
+            const bool sent = carryOut(order, frames);
+            if (write(orders, &sent, sizeof sent) != sizeof sent)
+                break;
+        }
+        _exit(0);
+    }
+
+    static bool carryOut(const Order& order, const Frames& frames)
+    {
+        const int peer = socket(AF_UNIX, SOCK_STREAM, 0);
+        bool sent =
+            connect(peer, reinterpret_cast<const sockaddr*>(&order.address), sizeof order.address) == 0;
+        for (std::size_t first = 0; sent && first < frames.size(); first += order.framesPerWrite)
+            sent = send(peer, frames.bytes(first, order.framesPerWrite));
+        char none = 0;
+        [[maybe_unused]] const ssize_t closed = read(peer, &none, 1); // until the receiver is done
+        close(peer);
+        return sent;
+    }
+
+    static bool send(int descriptor, std::span<const std::byte> bytes)
     {
         while (!bytes.empty()) {
             const ssize_t count = write(descriptor, bytes.data(), bytes.size());
             if (count <= 0)
-                _exit(1);
+                return false;
             bytes = bytes.subspan(static_cast<std::size_t>(count));
         }
+        return true;
     }
 
-    pid_t child;
+    pid_t child = -1;
+    int orders = -1;
 };
 
 } // namespace pelorus::bench

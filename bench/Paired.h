@@ -8,12 +8,17 @@
 
 namespace pelorus::bench {
 
-/// CLOCK_THREAD_CPUTIME_ID where the work is this thread's alone: whoever else runs then costs it nothing.
 inline double secondsOf(clockid_t clock)
 {
     timespec now{};
     clock_gettime(clock, &now);
     return static_cast<double>(now.tv_sec) + static_cast<double>(now.tv_nsec) * 1e-9;
+}
+
+/// Processor time and not the time of day: whoever else runs on the machine then costs nothing.
+inline double processorSeconds()
+{
+    return secondsOf(CLOCK_PROCESS_CPUTIME_ID);
 }
 
 /// The value below which `share` of them lie.
@@ -26,14 +31,15 @@ inline double quantile(std::vector<double> values, double share)
 }
 
 /// Runs two ways of doing `items` pieces of work in turn, so that what else the machine does meets both, and
-/// reports how many times as fast ours is: the median of the rounds, and the quartiles as its spread.
-template <class Ours, class Theirs>
-void compare(benchmark::State& run, clockid_t clock, std::size_t items, Ours ours, Theirs theirs)
+/// reports how many times as fast ours is by the clock `seconds`: the median of the rounds, and the
+/// quartiles.
+template <class Seconds, class Ours, class Theirs>
+void compare(benchmark::State& run, Seconds seconds, std::size_t items, Ours ours, Theirs theirs)
 {
-    const auto timed = [clock](auto& work) {
-        const double begin = secondsOf(clock);
+    const auto timed = [&seconds](auto& work) {
+        const double begin = seconds();
         work();
-        return secondsOf(clock) - begin;
+        return seconds() - begin;
     };
     ours(); // what only the first time costs belongs to neither
     theirs();

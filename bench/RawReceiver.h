@@ -4,7 +4,6 @@
 
 #include <benchmark/benchmark.h>
 #include <cstring>
-#include <stdexcept>
 
 namespace pelorus::bench {
 

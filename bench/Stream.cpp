@@ -81,7 +81,7 @@ void decodeBesideWalk(benchmark::State& run)
     const bench::Dispatch dispatch(stream);
     Decoder decoder(stream, kTechnologies[run.range(0)]);
     bench::compare(
-        run, CLOCK_THREAD_CPUTIME_ID, stream.size(), [&] { decoder.decode(); },
+        run, bench::processorSeconds, stream.size(), [&] { decoder.decode(); },
         [&] { benchmark::DoNotOptimize(dispatch.walk(stream.bytes())); });
     run.SetLabel(kTechnologies[run.range(0)]);
 }

@@ -1,19 +1,13 @@
 """The parts of a Markdown file that are written by a program: what stands between `<!-- NAME -->` and the
 `<!-- end -->` that follows. All else is left as it is."""
 
-import re
-
-
-def _block(name):
-    return re.compile(rf"(?<=<!-- {re.escape(name)} -->\n).*?(?=<!-- end -->)", re.DOTALL)
-
-
-def block_names(document):
-    return [name for name in re.findall(r"<!-- ([\w-]+) -->", document) if name != "end"]
-
 
 def with_block(document, name, content):
-    replaced, count = _block(name).subn(lambda _: f"\n{content}\n\n", document)
-    if count != 1:
-        raise ValueError(f"the document has {count} blocks <!-- {name} --> where one belongs")
-    return replaced
+    mark, end = f"<!-- {name} -->\n", "<!-- end -->"
+    if document.count(mark) != 1:
+        raise ValueError(f"the document has {document.count(mark)} blocks <!-- {name} --> where one belongs")
+    before, rest = document.split(mark)
+    _, found, after = rest.partition(end)
+    if not found:
+        raise ValueError(f"the block <!-- {name} --> of the document has no {end}")
+    return f"{before}{mark}\n{content}\n\n{end}{after}"

@@ -5,7 +5,9 @@ import random
 import struct
 
 from .bits import Bits
+from .pcap import file_header, record_header
 
+ETHERNET = 1  # link type
 PORT = 4729  # of GSMTAP
 UM, LTE_RRC = 0x01, 0x0D  # types of its payload
 UL_DCCH, BCCH_BCH, BCCH_DL_SCH, PCCH = 3, 4, 5, 6  # channels of LTE RRC
@@ -36,7 +38,8 @@ def paging(choice):
 
 
 def master_information(choice):
-    return Bits().put(choice.randrange(6), 3).put(choice.randrange(8), 3).put(choice.randrange(256), 8).put(0, 10).bytes()
+    bits = Bits().put(choice.randrange(6), 3).put(choice.randrange(8), 3)
+    return bits.put(choice.randrange(256), 8).put(0, 10).bytes()
 
 
 def system_information(choice):
@@ -84,22 +87,15 @@ def in_udp(payload, number):
 
 
 def write_capture(path, packets, seed=1):
-    """Some 24,000 different messages in turn, each in a packet with header values of its own. The mean length of
-    the GSMTAP messages, header included."""
+    """Some 24,000 different messages in turn, each in a packet with header values of its own."""
     choice = random.Random(seed)
-    weights = [kind[0] for kind in KINDS]
-    pool = []
-    for _, kind, channel, make in choice.choices(KINDS, weights, k=24000):
-        pool.append((kind, channel, make(choice)))
-    total = 0
+    kinds = choice.choices(KINDS, [kind[0] for kind in KINDS], k=24_000)
+    pool = [(kind, channel, make(choice)) for _, kind, channel, make in kinds]
     with open(path, "wb", buffering=1 << 20) as file:
-        file.write(struct.pack("<IHHiIII", 0xA1B2C3D4, 2, 4, 0, 0, 65535, 1))  # Ethernet
+        file.write(file_header(ETHERNET))
         for number in range(packets):
             kind, channel, content = pool[number % len(pool)]
             header = struct.pack(">BBBBHbbIBBBB", 2, 4, kind, 0, number * 7 % 1024, -50 - number % 60,
                                  number % 30, number % 2715648, channel, 0, 0, 0)
-            total += len(header) + len(content)
             packet = in_udp(header + content, number)
-            file.write(struct.pack("<IIII", 1767225600 + number // 300, number % 300 * 3333, len(packet), len(packet)))
-            file.write(packet)
-    return total / packets
+            file.write(record_header(number / 300, len(packet)) + packet)

@@ -6,9 +6,9 @@ import struct
 import subprocess
 
 from .gsmtap import write_capture
+from .pcap import file_header, record_header
 
 LTE = "Osprey LTE"
-START = 1767225600  # of what is recorded, in seconds since 1970
 USER0 = 147
 
 
@@ -26,10 +26,10 @@ class Recordings:
 
     @functools.cache
     def radio(self, count):
-        """A GSMTAP capture, and the mean length of its messages."""
+        """A GSMTAP capture."""
         path = self.directory / f"gsmtap-{count}.pcap"
-        length = write_capture(path, count)
-        return self.read_once(path), length
+        write_capture(path, count)
+        return self.read_once(path)
 
     @functools.cache
     def neighbours(self, each, count):
@@ -38,17 +38,16 @@ class Recordings:
         choice = random.Random(1)
         pool = [neighbour_report(each, choice) for _ in range(1000)]
         with open(path, "wb", buffering=1 << 20) as file:
-            file.write(struct.pack("<IHHiIII", 0xA1B2C3D4, 2, 4, 0, 0, 65535, USER0))
+            file.write(file_header(USER0))
             for number in range(count):
                 message = pool[number % len(pool)]
-                file.write(struct.pack("<IIII", START + number // 1000, number % 1000 * 1000, len(message), len(message)))
-                file.write(message)
+                file.write(record_header(number / 1000, len(message)) + message)
         return self.read_once(path)
 
     @functools.cache
     def without_messages(self):
         path = self.directory / "empty.pcap"
-        path.write_bytes(struct.pack("<IHHiIII", 0xA1B2C3D4, 2, 4, 0, 0, 65535, USER0))
+        path.write_bytes(file_header(USER0))
         return path
 
     @staticmethod

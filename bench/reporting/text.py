@@ -25,7 +25,7 @@ def times(ratio):
     """How many times as much; less than a half as a part."""
     if ratio >= 0.5:
         return f"{ratio:.0f}" if ratio >= 20 else f"{ratio:.2g}"
-    return f"1/{1 / ratio:.0f}" if ratio < 0.1 else f"1/{1 / ratio:.1f}"
+    return f"1/{float(f'{1 / ratio:.2g}'):g}"
 
 
 def table(head, rows):
