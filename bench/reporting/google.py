@@ -1,6 +1,7 @@
 """The Google benchmarks, read from their JSON."""
 
 import json
+import os
 import subprocess
 
 from .processes import Spread, one_core
@@ -10,13 +11,14 @@ UNITS = {"ns": 1e-9, "us": 1e-6, "ms": 1e-3, "s": 1}
 
 
 class Benchmarks:
-    def __init__(self, directory, quick):
+    def __init__(self, directory, scratch, quick):
         self.directory = directory
+        self.environment = dict(os.environ, TMPDIR=str(scratch))
         self.quick = quick
 
     def run(self, program, *options):
         command = [*one_core(), self.directory / f"bench_{program}", "--benchmark_format=json", *options]
-        result = subprocess.run(command, check=True, capture_output=True, text=True)
+        result = subprocess.run(command, check=True, capture_output=True, text=True, env=self.environment)
         found = json.loads(result.stdout)["benchmarks"]
         for entry in found:
             if entry.get("error_occurred"):
