@@ -24,22 +24,21 @@ class Target:
 
 KEPT = "all raw messages since the tree was last shown are kept for the snapshot"
 
-FIELDS = Target("`tshark -T fields`, 8 fields", 25, 50, "rows, property lists, reading the file, in this order")
+FIELDS = Target("`tshark -T fields`, 8 fields", 25, 50, "writing rows, then reading the file")
 LOGGED = Target("the same with our system log written to a file")
 TEXT = Target("`tshark -V`: every row of every message as text, once", 10, 30,
-              "half goes into the telephony server's lists, half into copying the display for the history, building the "
-              "tree and writing its text")
+              "seven tenths go into the refresh: building the tree, writing its text, copying the display for the history")
 FRAMING = Target("`tcpdump -r FILE -w /dev/null`: reading and framing", 0.5, 1,
                  "the program's start, and the raw messages that are kept for the snapshot")
 WALK = "walking in memory, dispatch and three fields: "
 WALK_LTE = Target(WALK + "Osprey LTE", 1 / 40, 1 / 10,
-                  "three tenths go into the telephony server's lists, most of the rest into writing rows")
+                  "writing rows takes half of it, lists of row dictionaries and their lock a fifth")
 FRAMES = Target("a bare socket, a frame a write: receiving and framing", 0.5, 0.8,
                 "what each wake-up passes on its way from the socket to the callback")
 BATCHES = Target("decoding in memory: receiving 64 frames a write, and decoding", 0.7, 0.9,
                  "what each frame passes on its way from the socket to the callback, and the sender's part")
 LIST = Target("libplist's own parse of a binary list of 6 cells: parse and rows", 1, 5,
-              "the guard that walks the list first, libplist itself, and the copy into our own values")
+              "reading the list takes eight tenths of it, much of that in the allocator")
 START = Target("tshark's start-up: one packet, on the clock", 20, None, "loading and binding the shared libraries")
 PEAK = Target(f"tshark's peak memory, {PACKETS:,} packets", 10, None, KEPT)
 GROWTH = Target("our own peak memory of 10,000 messages: 1,000,000", 0.9, None, KEPT)
