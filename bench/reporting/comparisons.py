@@ -45,7 +45,7 @@ class Comparisons:
     def rows(self):
         yield from self.beside_fields()
         yield self.growth()
-        yield self.beside_text()
+        yield from self.beside_text()
         yield self.beside_framing()
         yield from self.in_memory()
         yield self.beside_start()
@@ -71,7 +71,10 @@ class Comparisons:
     def beside_text(self):
         pairs = self.measure.pairs(self.decode(self.recordings.simulated(SHOWN, "--rounds"), "--every", "0.5"),
                                    ["tshark", "-n", "-V", "-r", self.recordings.radio(SHOWN)], self.rounds)
-        return both(targets.TEXT, pairs, "processor", rate(SHOWN))
+        yield both(targets.TEXT, pairs, "processor", rate(SHOWN))
+        # The messages of one measurement are 2 ms apart.
+        whole = self.measure.several(self.decode(self.recordings.simulated(SHOWN), "--every", "0.001"), self.rounds)
+        yield both(targets.WHOLE, [(ours, theirs) for ours, (_, theirs) in zip(whole, pairs)], "processor", rate(SHOWN))
 
     def beside_framing(self):
         recording = self.recordings.simulated(PACKETS, "--unknown")

@@ -27,7 +27,9 @@ KEPT = "all raw messages since the tree was last shown are kept for the snapshot
 FIELDS = Target("`tshark -T fields`, 8 fields", 25, 50, "writing rows, then reading the file")
 LOGGED = Target("the same with our system log written to a file")
 TEXT = Target("`tshark -V`: every row of every message as text, once", 10, 30,
-              "seven tenths go into the refresh: building the tree, writing its text, copying the display for the history")
+              "seven tenths go into the refresh: building the tree, writing its text, copying the display for the "
+              "history")
+WHOLE = Target("the same, our whole tree after each message")
 FRAMING = Target("`tcpdump -r FILE -w /dev/null`: reading and framing", 0.5, 1,
                  "the program's start, and the raw messages that are kept for the snapshot")
 WALK = "walking in memory, dispatch and three fields: "
