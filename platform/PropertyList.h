@@ -14,14 +14,14 @@ enum class PropertyListForm { xml, binary };
 
 /// Bounds that no honest list reaches and no hostile one may pass.
 struct PropertyListLimits {
-    static constexpr std::size_t input = 256 * 1024 * 1024;
+    static constexpr std::size_t input = std::size_t{256} * 1024 * 1024;
     static constexpr std::size_t depth = 256;      // containers within containers
     static constexpr std::size_t values = 250'000; // keys included, after shared references are expanded
     /// Of text and data beyond the list's own length, after expansion: a snapshot's raw log may be as long as
     /// the file, and only shared references can make more of it.
-    static constexpr std::size_t expansion = 64 * 1024 * 1024;
+    static constexpr std::size_t expansion = std::size_t{64} * 1024 * 1024;
     /// Of the values' paths, each from the root and counted anew: who shows a list has an index of them.
-    static constexpr std::size_t paths = 128 * 1024 * 1024;
+    static constexpr std::size_t paths = std::size_t{128} * 1024 * 1024;
     /// Steps of the two things whose cost libplist lets grow with the square of a list's size, both in XML:
     /// the keys of one dictionary, some 18,000 of which are allowed, and the entities of one text, half a
     /// megabyte of which may be nothing else. Ten nanoseconds or so each.

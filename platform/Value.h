@@ -160,7 +160,7 @@ public:
     requires(std::convertible_to<const Text&, std::string_view> &&
              !std::is_array_v<Text>) void set(const Text& key, Value value)
     {
-        setText(key, std::move(value));
+        setText(std::string_view(key), std::move(value));
     }
     /// Where the value under a key is; a nil to be filled at once when the key was absent.
     Value& slot(const Key& key);
@@ -217,10 +217,6 @@ Data makeData(std::vector<std::byte> bytes);
 
 /// A value that shares no container with the original. Data, which cannot change, stays shared.
 Value deepCopy(const Value& value);
-/// As deepCopy(), but containers that equal their counterparts in `earlier`, entry by entry in the same
-/// order, are those: of two displays that few rows tell apart only those sections are copied. Neither value
-/// may be changed then.
-Value deepCopySharing(const Value& value, const Value& earlier);
 /// As deepCopy(), but what equals its counterpart in `earlier`, entry by entry in the same order, is shared
 /// with that: of two displays that few rows tell apart only those rows are copied. Neither may be changed
 /// then.
