@@ -31,6 +31,9 @@ public:
     /// What a saved snapshot holds.
     virtual std::shared_ptr<Array> getSaveContentsFromState(const State& state) const;
 
+    /// For who saves no snapshot: from now on raw messages are dropped, and "DisplayState" is empty.
+    void dropRawMessages() { keepsRawMessages = false; }
+
     /// Appends what is shown now to state["History"], which keeps the newest 5.
     static void updateHistoryInState(Platform& platform, State& state);
 
@@ -54,6 +57,7 @@ protected:
     static bool adoptState(State& state, std::string_view kind);
 
     Platform& platform;
+    bool keepsRawMessages = true;
 };
 
 } // namespace pelorus

@@ -16,12 +16,13 @@ using Node = std::shared_ptr<const PelorusModelNode>;
 /// Builds the nodes of one tree. The path of the node in work is kept in one string that grows and shrinks.
 class TreeBuilder {
 public:
-    explicit TreeBuilder(PathDictionary& dictionary) : paths(dictionary), path("/") {}
+    explicit TreeBuilder(PathDictionary* dictionary) : paths(dictionary), path("/") {}
 
     Node build(std::string_view name, const Value& object)
     {
         Node node = make(name, object);
-        paths.insert_or_assign(path, node);
+        if (paths)
+            paths->insert_or_assign(path, node);
         return node;
     }
 
@@ -97,7 +98,7 @@ private:
         return children;
     }
 
-    PathDictionary& paths;
+    PathDictionary* paths;
     std::string path;
 };
 
@@ -113,7 +114,12 @@ void appendPathComponent(std::string& path, std::string_view name)
 std::shared_ptr<const PelorusModelNode> PelorusModelNode::makeTreeFromObject(const Value& object,
                                                                              PathDictionary& paths)
 {
-    return TreeBuilder(paths).build("Pelorus", object);
+    return TreeBuilder(&paths).build("Pelorus", object);
+}
+
+std::shared_ptr<const PelorusModelNode> PelorusModelNode::makeTreeFromObject(const Value& object)
+{
+    return TreeBuilder(nullptr).build("Pelorus", object);
 }
 
 } // namespace pelorus

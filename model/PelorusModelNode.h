@@ -33,6 +33,8 @@ public:
     /// `paths`. Of siblings with the same name all are children, and the last one is found by path.
     static std::shared_ptr<const PelorusModelNode> makeTreeFromObject(const Value& object,
                                                                       PathDictionary& paths);
+    /// The same for who asks for no node by its path.
+    static std::shared_ptr<const PelorusModelNode> makeTreeFromObject(const Value& object);
 
 protected:
     explicit PelorusModelNode(std::string_view nodeName) : name(nodeName) {}

@@ -42,6 +42,8 @@ int decodeRecording(RecordingReader& recording, const DecodeOptions& options)
                            [&options](const PelorusModelNode& root, std::optional<RecordedTime> lastMessage) {
                                print(options.json ? treeJson(root, lastMessage) : treeText(root));
                            });
+    if (options.save.empty())
+        monitor.saveNothing();
     RecordedMessage message;
     RecordingReader::Next next{};
     while ((next = recording.next(message)) == RecordingReader::Next::message)

@@ -40,9 +40,8 @@ void OfflineMonitor::finish()
 void OfflineMonitor::refresh()
 {
     updated = false;
-    PathDictionary paths;
     const Value display = generator->generateLogUsingState(state);
-    refreshed(*PelorusModelNode::makeTreeFromObject(display, paths), lastMessage);
+    refreshed(*PelorusModelNode::makeTreeFromObject(display), lastMessage);
 }
 
 } // namespace pelorus

@@ -20,6 +20,9 @@ public:
     OfflineMonitor(std::unique_ptr<LogGenerator> technology, std::optional<std::chrono::nanoseconds> every,
                    Refreshed callback);
 
+    /// For who does not ask for saveContents(): the memory that is used stays the same however long the
+    /// recording is.
+    void saveNothing() { generator->dropRawMessages(); }
     void receive(const RecordedMessage& message);
     /// The refresh at the end: always without an interval, else when something arrived since the last one.
     void finish();

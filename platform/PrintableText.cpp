@@ -2,6 +2,7 @@
 
 #include "platform/Utf8.h"
 
+#include <algorithm>
 #include <fmt/format.h>
 
 namespace pelorus {
@@ -17,6 +18,9 @@ std::string escaped(unsigned char byte)
 
 std::string printable(std::string_view text)
 {
+    // Nearly all texts are plain.
+    if (std::all_of(text.begin(), text.end(), [](char c) { return c >= 0x20 && c < 0x7F; }))
+        return std::string(text);
     std::string shown;
     std::size_t validEnd = validUtf8Prefix(text);
     for (std::size_t place = 0; place < text.size(); ++place) {

@@ -19,7 +19,8 @@ protected:
 
     void keepRawMessage(std::span<const std::byte> data)
     {
-        binData.insert(binData.end(), data.begin(), data.end());
+        if (keepsRawMessages)
+            binData.insert(binData.end(), data.begin(), data.end());
     }
     /// Moves the raw messages into state["DisplayState"].
     void handOverRawMessages(State& state);

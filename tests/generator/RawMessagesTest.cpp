@@ -42,6 +42,14 @@ TEST_F(RawMessages, AreThoseSinceTheGenerationBefore)
     EXPECT_EQ(history[2].dictionary()->at("DisplayState"), Value(makeData({})));
 }
 
+TEST_F(RawMessages, AreDroppedForWhoSavesNothing)
+{
+    generator.dropRawMessages();
+    receive(packet(1, 0x1234));
+    generator.generateLogUsingState(state);
+    EXPECT_EQ(state.at("DisplayState"), Value(makeData({})));
+}
+
 TEST_F(RawMessages, StayAsTheyWereForWhoHoldsThem)
 {
     constexpr unsigned kRounds = 12; // more than the history keeps, so that memory is used again
