@@ -1,12 +1,13 @@
 // Messages from another process over the log channel's socket to the model, with and without decoding, beside
-// what a bare socket and decoding in memory take. The comparisons count the processor time of the sender and
-// the receiver together, and are meant to run on one core, where that is what a message takes.
+// what a bare socket and decoding a recording take. The comparisons count the processor time of the sender
+// and the receiver together, and are meant to run on one core, where that is what a message takes.
 
 #include "bench/FrameSender.h"
 #include "bench/Paired.h"
 #include "bench/RawReceiver.h"
 #include "model/PelorusModel.h"
 #include "platform/linux/LinuxPlatform.h"
+#include "platform/recording/PcapRecording.h"
 
 #include <QCoreApplication>
 #include <QEventLoop>
@@ -55,11 +56,21 @@ public:
         return sender.succeeded() && all;
     }
 
-    void decodeInMemory()
+    /// As pelorusctl decodes a recording of the same messages. False when some were lost.
+    bool decodeRecording()
     {
-        for (std::size_t index = 0; index < stream.size(); ++index)
-            generator->updateState(state, stream[index]);
+        if (!std::filesystem::exists(recordingPath()))
+            writeRecording();
+        std::string why;
+        const auto recording = RecordingReader::open(recordingPath(), why);
+        std::size_t received = 0;
+        RecordedMessage message;
+        while (recording && recording->next(message) == RecordingReader::Next::message) {
+            generator->updateState(state, message.bytes);
+            ++received;
+        }
         generator->generateLogUsingState(state);
+        return received == stream.size();
     }
 
     /// Of both processes' work.
@@ -68,6 +79,15 @@ public:
     const bench::MessageStream stream = bench::MessageStream("Osprey LTE", kMessages);
 
 private:
+    static std::string recordingPath() { return socketPath("recording"); }
+    void writeRecording() const
+    {
+        std::string why;
+        const auto writer = RecordingWriter::create(recordingPath(), why);
+        for (std::size_t index = 0; writer && index < stream.size(); ++index)
+            writer->write({RecordedTime(), stream[index]});
+    }
+
     const bench::Frames frames = bench::Frames(stream);
     bench::FrameSender sender = bench::FrameSender(frames);
     bench::RawReceiver raw = bench::RawReceiver(socketPath("raw"));
@@ -102,18 +122,18 @@ void framesBesideRaw(benchmark::State& run)
 }
 BENCHMARK(framesBesideRaw)->UseManualTime()->Iterations(15)->Unit(benchmark::kMillisecond);
 
-/// 64 frames a write, decoded, against the same messages decoded in memory.
-void batchesBesideMemory(benchmark::State& run)
+/// 64 frames a write, decoded, against the same messages decoded from a recording.
+void batchesBesideRecording(benchmark::State& run)
 {
     Receiver receiver;
     bool all = true;
     bench::compare(
         run, [&] { return receiver.seconds(); }, receiver.stream.size(),
-        [&] { all = receiver.receive(64, true) && all; }, [&] { receiver.decodeInMemory(); });
+        [&] { all = receiver.receive(64, true) && all; }, [&] { all = receiver.decodeRecording() && all; });
     if (!all)
         run.SkipWithError("frames were lost");
 }
-BENCHMARK(batchesBesideMemory)->UseManualTime()->Iterations(15)->Unit(benchmark::kMillisecond);
+BENCHMARK(batchesBesideRecording)->UseManualTime()->Iterations(15)->Unit(benchmark::kMillisecond);
 
 } // namespace
 

@@ -87,7 +87,7 @@ class Comparisons:
             yield rates(targets.WALK_LTE if label == LTE else Target(targets.WALK + label), found, "messages/s")
         found = self.bench.comparisons("Sockets")
         yield rates(targets.FRAMES, found["framesBesideRaw"], "messages/s")
-        yield rates(targets.BATCHES, found["batchesBesideMemory"], "messages/s")
+        yield rates(targets.BATCHES, found["batchesBesideRecording"], "messages/s")
         found, = self.bench.comparisons("CellList").values()
         yield rates(targets.LIST, found, "lists/s")
 

@@ -37,7 +37,7 @@ WALK_LTE = Target(WALK + "Osprey LTE", 1 / 40, 1 / 10,
                   "writing rows takes half of it, lists of row dictionaries and their lock a fifth")
 FRAMES = Target("a bare socket, a frame a write: receiving and framing", 0.5, 0.8,
                 "what each wake-up passes on its way from the socket to the callback")
-BATCHES = Target("decoding in memory: receiving 64 frames a write, and decoding", 0.7, 0.9,
+BATCHES = Target("decoding a recording: receiving 64 frames a write, and decoding", 0.7, 0.9,
                  "what each frame passes on its way from the socket to the callback, and the sender's part")
 LIST = Target("libplist's own parse of a binary list of 6 cells: parse and rows", 1, 5,
               "reading the list takes eight tenths of it, much of that in the allocator")
