@@ -19,7 +19,10 @@ namespace {
 
 constexpr std::string_view kTechnology = PELORUS_TECHNOLOGY;
 constexpr std::size_t kHeaderLength = 13;
-constexpr int kMostOperations = 64;
+// A refresh and a restart take as long as many messages.
+constexpr int kMostOperations = 48;
+constexpr int kMostRefreshes = 6;
+constexpr int kMostRestarts = 2;
 
 enum Option : unsigned {
     firstLogs = 1,
@@ -123,12 +126,17 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const unsigned options = input.byte();
     GeneratorRun first(platform(), kTechnology, templates(), options & firstLogs);
     GeneratorRun second(platform(), kTechnology, templates(), options & secondLogs);
+    int refreshes = 0;
+    int restarts = 0;
     bool received = false;
     for (int count = 0; !input.empty() && count < kMostOperations; ++count) {
         const unsigned operation = input.byte() % kOperations;
         if (operation == refresh) {
-            first.refresh();
+            if (++refreshes <= kMostRefreshes)
+                first.refresh();
         } else if (operation == restart) {
+            if (++restarts > kMostRestarts)
+                continue;
             first.restart();
             second.restart();
         } else {
