@@ -21,7 +21,7 @@ constexpr std::string_view kTechnology = PELORUS_TECHNOLOGY;
 constexpr std::size_t kHeaderLength = 13;
 // A refresh and a restart take as long as many messages.
 constexpr int kMostOperations = 48;
-constexpr int kMostRefreshes = 6;
+constexpr std::size_t kMostRefreshes = 6;
 constexpr int kMostRestarts = 2;
 
 enum Option : unsigned {
@@ -108,6 +108,24 @@ std::vector<std::byte> messageFrom(Input& input, unsigned operation)
     return bytes;
 }
 
+/// The history's newest entry last, as the refreshes that made them.
+void checkHistory(const GeneratorRun& run, const std::vector<Shown>& refreshes)
+{
+    const Value history = run.currentState().at("History");
+    require(history.array() && history.array()->elements.size() == std::min<std::size_t>(refreshes.size(), 5),
+            "the history holds the last five refreshes");
+    auto shown = refreshes.rbegin();
+    for (auto entry = history.array()->elements.rbegin(); entry != history.array()->elements.rend();
+         ++entry, ++shown) {
+        const Value display = entry->dictionary()->at("Display");
+        if (!display || shown->root->value()) // nothing yet, or the refresh that made the display
+            continue;
+        Shown kept;
+        kept.root = PelorusModelNode::makeTreeFromObject(display, kept.paths);
+        require(isSame(kept, *shown), "the history holds what was shown");
+    }
+}
+
 /// Five displays with as many values as one list may hold are more than one list may hold: that is refused,
 /// not wrong.
 void checkSave(const GeneratorRun& run)
@@ -126,14 +144,14 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const unsigned options = input.byte();
     GeneratorRun first(platform(), kTechnology, templates(), options & firstLogs);
     GeneratorRun second(platform(), kTechnology, templates(), options & secondLogs);
-    int refreshes = 0;
+    std::vector<Shown> refreshes;
     int restarts = 0;
     bool received = false;
     for (int count = 0; !input.empty() && count < kMostOperations; ++count) {
         const unsigned operation = input.byte() % kOperations;
         if (operation == refresh) {
-            if (++refreshes <= kMostRefreshes)
-                first.refresh();
+            if (refreshes.size() < kMostRefreshes)
+                refreshes.push_back(first.refresh());
         } else if (operation == restart) {
             if (++restarts > kMostRestarts)
                 continue;
@@ -148,7 +166,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
                 break;
         }
     }
-    const Shown shown = first.refresh();
+    const Shown& shown = refreshes.emplace_back(first.refresh());
+    checkHistory(first, refreshes);
     if (received) // the refresh that makes the display shows nothing yet
         require(isSame(shown, second.refresh()), "what is shown depends on the messages alone");
     if ((options & kSaves) == kSaves)
