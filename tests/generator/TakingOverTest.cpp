@@ -68,6 +68,15 @@ TEST_F(TakingOver, AnotherTechnologysDisplayIsDropped)
     EXPECT_EQ(state.at("History").array()->elements.size(), 2U);
 }
 
+TEST_F(TakingOver, DisplayOfNobodyIsDropped)
+{
+    state.find("Display")->dictionary()->at("First").dictionary()->set("Kept", "yes");
+    state.set("DisplayMaker", 7);
+    ProbeGenerator next(platform, std::make_shared<ProbeIndex>());
+    next.updateState(state, packet(1, 0x1234).bytes());
+    EXPECT_EQ(shown(), "First:\n  Code: 0x1234\nSecond:\n  Code: 0x1234\n");
+}
+
 TEST_F(TakingOver, DisplayIsBuiltAnewAfterAnotherTechnology)
 {
     GSMLogGenerator(platform).generateLogUsingState(state);

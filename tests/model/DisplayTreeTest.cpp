@@ -174,6 +174,18 @@ TEST_F(DisplayTree, TreeDoesNotFollowTheDisplay)
     EXPECT_EQ(*paths.at("/a")->value(), "1");
 }
 
+TEST_F(DisplayTree, IsTheSameWithoutAnIndex)
+{
+    const auto root = PelorusModelNode::makeTreeFromObject(
+        makeDictionary({{"Cells", makeArray({makeDictionary({{"PCI", "31"}})})}, {"Empty", makeArray()}}));
+    EXPECT_EQ(root->displayName(), "Pelorus");
+    ASSERT_THAT(*root->childNodes(), SizeIs(2));
+    const auto& cell = root->childNodes()->front()->childNodes()->front();
+    EXPECT_EQ(cell->displayName(), "0");
+    EXPECT_EQ(*cell->childNodes()->front()->value(), "31");
+    EXPECT_THAT(*root->childNodes()->back()->childNodes(), SizeIs(0));
+}
+
 TEST_F(DisplayTree, HoldsDeepDisplays)
 {
     Value display = "deep";

@@ -1,27 +1,12 @@
 #include "LogGenerator/LogGenerator.h"
 #include "platform/scripted/ScriptedPlatform.h"
 #include "telephonyd/simulation/Simulation.h"
-#include "tests/support/RecordingLog.h"
+#include "tests/support/SectionFixture.h"
 
 #include <gtest/gtest.h>
 #include <random>
 
 namespace pelorus::test {
-
-/// What every object shows, in display order.
-std::string shownBy(const Value& object)
-{
-    if (const std::string* text = object.string())
-        return *text;
-    std::string all = "{";
-    if (const Array* array = object.array())
-        for (const Value& element : array->elements)
-            all += shownBy(element) + ";";
-    if (const Dictionary* dictionary = object.dictionary())
-        for (const auto& [key, value] : *dictionary)
-            all += std::string(key.text()) + "=" + shownBy(value) + ";";
-    return all + "}";
-}
 
 /// Two generators that get the same messages: one is looked at after each of them, the other now and then.
 class OvertakenPackets : public testing::TestWithParam<std::string_view> {
@@ -35,7 +20,7 @@ protected:
         std::string look()
         {
             state.remove("History"); // it is not what this is about, and copying it takes most of the time
-            return shownBy(generator->generateLogUsingState(state));
+            return textOf(generator->generateLogUsingState(state));
         }
         /// The name of the exception that ends the program, if one does.
         std::string receive(std::span<const std::byte> message)
@@ -80,7 +65,7 @@ protected:
 
 TEST_P(OvertakenPackets, AreMissedByNobodyWhoLooksLater)
 {
-    expectTheSameDisplays(5'000, leave);
+    expectTheSameDisplays(2'000, leave);
 }
 
 TEST_P(OvertakenPackets, AreMissedByNobodyWhileTheSystemLogListens)
@@ -92,7 +77,7 @@ TEST_P(OvertakenPackets, AreMissedByNobodyWhileTheSystemLogListens)
 TEST_P(OvertakenPackets, AreMissedByNobodyWhenSomeAreBroken)
 {
     std::mt19937 random(20120504); // NOLINT(cert-msc51-cpp): repeatable on purpose
-    expectTheSameDisplays(5'000, [&random](std::vector<std::byte>& bytes) {
+    expectTheSameDisplays(2'000, [&random](std::vector<std::byte>& bytes) {
         if (random() % 4 == 0)
             bytes.resize(random() % (bytes.size() + 1));
         for (std::size_t place = 13 + random() % 40; place < bytes.size(); place += 1 + random() % 40)
