@@ -1,6 +1,7 @@
 #include "platform/Value.h"
 
 #include <algorithm>
+#include <span>
 
 namespace pelorus {
 
@@ -116,58 +117,90 @@ Data makeData(std::vector<std::byte> bytes)
 
 namespace {
 
-bool equalInOrder(const Value& a, const Value& b)
+/// Nothing when the value equals `earlier`, else a copy that shares with it what does. Each value is looked
+/// at once: to ask for equality on every level takes the depth times as long.
+std::optional<Value> changedCopy(const Value& value, const Value& earlier);
+
+std::optional<Value> changedArray(const Array& array, const Array& earlier)
 {
-    if (a.array() && b.array())
-        return std::equal(a.array()->elements.begin(), a.array()->elements.end(), b.array()->elements.begin(),
-                          b.array()->elements.end(), equalInOrder);
-    if (a.dictionary() && b.dictionary())
-        return std::equal(a.dictionary()->begin(), a.dictionary()->end(), b.dictionary()->begin(),
-                          b.dictionary()->end(), [](const auto& left, const auto& right) {
-                              return left.key == right.key && equalInOrder(left.value, right.value);
-                          });
-    return a == b;
+    const auto& before = earlier.elements;
+    std::shared_ptr<Array> copy; // none while all elements are equal
+    const auto startCopy = [&](std::size_t place) {
+        copy = makeArray();
+        copy->elements.reserve(array.elements.size());
+        copy->elements.assign(before.begin(), before.begin() + static_cast<std::ptrdiff_t>(place));
+    };
+    if (array.elements.size() < before.size())
+        startCopy(0);
+    for (std::size_t i = 0; i < array.elements.size(); ++i) {
+        std::optional<Value> changed = i < before.size() ? changedCopy(array.elements[i], before[i])
+                                                         : std::optional(deepCopy(array.elements[i]));
+        if (changed && !copy)
+            startCopy(i);
+        if (copy)
+            copy->elements.push_back(changed ? *std::move(changed) : before[i]);
+    }
+    return copy ? std::optional<Value>(std::move(copy)) : std::nullopt;
 }
 
-Value copyBeside(const Value& value, const Value* earlier)
+std::optional<Value> changedDictionary(const Dictionary& dictionary, const Dictionary& earlier)
 {
-    if (earlier && equalInOrder(value, *earlier))
-        return *earlier;
-    if (const Array* array = value.array()) {
-        const Array* const other = earlier ? earlier->array() : nullptr;
-        auto copy = makeArray();
-        copy->elements.reserve(array->elements.size());
-        for (std::size_t i = 0; i < array->elements.size(); ++i)
-            copy->elements.push_back(copyBeside(
-                array->elements[i], other && i < other->elements.size() ? &other->elements[i] : nullptr));
-        return copy;
+    const auto before = std::span(earlier.begin(), earlier.end());
+    std::shared_ptr<Dictionary> copy;
+    const auto startCopy = [&](std::size_t place) {
+        copy = makeDictionary();
+        copy->reserve(dictionary.size());
+        for (const auto& entry : before.first(place))
+            copy->append(entry.key, entry.value);
+    };
+    if (dictionary.size() < before.size())
+        startCopy(0);
+    std::size_t i = 0;
+    for (const auto& [key, value] : dictionary) {
+        std::optional<Value> changed =
+            i < before.size() ? changedCopy(value, before[i].value) : std::optional(deepCopy(value));
+        if (!copy && (changed || !(key == before[i].key)))
+            startCopy(i);
+        if (copy)
+            copy->append(key, changed ? *std::move(changed) : before[i].value);
+        ++i;
     }
-    if (const Dictionary* dictionary = value.dictionary()) {
-        const Dictionary* const other = earlier ? earlier->dictionary() : nullptr;
-        auto copy = makeDictionary();
-        copy->reserve(dictionary->size());
-        for (const auto& entry : *dictionary) {
-            const Value* const before =
-                other && copy->size() < other->size()
-                    ? &(other->begin() + static_cast<std::ptrdiff_t>(copy->size()))->value
-                    : nullptr;
-            copy->append(entry.key, copyBeside(entry.value, before));
-        }
-        return copy;
-    }
-    return value;
+    return copy ? std::optional<Value>(std::move(copy)) : std::nullopt;
+}
+
+std::optional<Value> changedCopy(const Value& value, const Value& earlier)
+{
+    if (value.array() && earlier.array())
+        return changedArray(*value.array(), *earlier.array());
+    if (value.dictionary() && earlier.dictionary())
+        return changedDictionary(*value.dictionary(), *earlier.dictionary());
+    return value == earlier ? std::nullopt : std::optional(deepCopy(value));
 }
 
 } // namespace
 
 Value deepCopy(const Value& value)
 {
-    return copyBeside(value, nullptr);
+    if (const Array* array = value.array()) {
+        auto copy = makeArray();
+        copy->elements.reserve(array->elements.size());
+        for (const Value& element : array->elements)
+            copy->elements.push_back(deepCopy(element));
+        return copy;
+    }
+    if (const Dictionary* dictionary = value.dictionary()) {
+        auto copy = makeDictionary();
+        copy->reserve(dictionary->size());
+        for (const auto& entry : *dictionary)
+            copy->append(entry.key, deepCopy(entry.value));
+        return copy;
+    }
+    return value;
 }
 
 Value deepCopySharing(const Value& value, const Value& earlier)
 {
-    return copyBeside(value, &earlier);
+    return changedCopy(value, earlier).value_or(earlier);
 }
 
 std::optional<std::int32_t> signed32(const Value* value)
