@@ -174,6 +174,8 @@ std::optional<Value> changedCopy(const Value& value, const Value& earlier)
         return changedArray(*value.array(), *earlier.array());
     if (value.dictionary() && earlier.dictionary())
         return changedDictionary(*value.dictionary(), *earlier.dictionary());
+    if (value.data()) // shared as it is, and long to compare
+        return value;
     return value == earlier ? std::nullopt : std::optional(deepCopy(value));
 }
 
