@@ -20,7 +20,7 @@ if(PELORUS_HARDENING AND NOT PELORUS_SANITIZE)
   target_link_options(pelorus_compile INTERFACE -Wl,-z,relro -Wl,-z,now -Wl,-z,noexecstack)
 endif()
 if(PELORUS_COVERAGE)
-  target_compile_options(pelorus_compile INTERFACE --coverage -fprofile-update=atomic)
+  target_compile_options(pelorus_compile INTERFACE --coverage)
   target_link_options(pelorus_compile INTERFACE --coverage)
 endif()
 if(PELORUS_SANITIZE)
@@ -72,4 +72,11 @@ endfunction()
 # (Layout, kRows), each in its unnamed namespace.
 function(pelorus_compile_singly)
   set_target_properties(${ARGN} PROPERTIES UNITY_BUILD OFF)
+endfunction()
+
+# pelorus_precompile(TARGET HEADERS...): the standard library's and the given headers are read once for the target, which
+# has many small sources.
+function(pelorus_precompile target)
+  target_precompile_headers(${target} PRIVATE <algorithm> <array> <chrono> <functional> <memory> <optional> <span> <string>
+                                              <string_view> <unordered_map> <variant> <vector> <fmt/format.h> ${ARGN})
 endfunction()

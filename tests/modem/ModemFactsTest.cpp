@@ -11,7 +11,7 @@ namespace pelorus {
 
 namespace {
 
-std::string shown(const Value& rows)
+std::string asLines(const Value& rows)
 {
     std::string text;
     for (const auto& [key, value] : *rows.dictionary())
@@ -122,20 +122,21 @@ TEST(ModemSimFiles, AreTexts)
                              {"Eid", ""}};
     const QVariantMap modem = {{"OwnNumbers", QVariantList{"+491713920012", "", "+491713920013"}},
                                {"CurrentModes", QVariantList{14U, 0U}}};
-    EXPECT_EQ(shown(simFilesOf(sim, modem)), "kSimFile_ICCID: 89490100001234567897\n"
-                                             "kSimFile_MSISDN: +491713920012, +491713920013\n"
-                                             "kSimFile_AHPLMN: 00101\n"
-                                             "kSimFile_RATMODE: LTE, UMTS, GSM\n"
-                                             "kSimFile_PNN: Test Network\n");
+    EXPECT_EQ(asLines(simFilesOf(sim, modem)), "kSimFile_ICCID: 89490100001234567897\n"
+                                               "kSimFile_MSISDN: +491713920012, +491713920013\n"
+                                               "kSimFile_AHPLMN: 00101\n"
+                                               "kSimFile_RATMODE: LTE, UMTS, GSM\n"
+                                               "kSimFile_PNN: Test Network\n");
 }
 
 TEST(ModemSimFiles, OfALockedSimAreEmptyAndNotThoseOfTheOneBefore)
 {
-    EXPECT_EQ(shown(simFilesOf({}, {{"CurrentModes", QVariantList{0xFFFFFFFFU, 0U}}})), "kSimFile_ICCID: \n"
-                                                                                        "kSimFile_MSISDN: \n"
-                                                                                        "kSimFile_AHPLMN: \n"
-                                                                                        "kSimFile_RATMODE: \n"
-                                                                                        "kSimFile_PNN: \n");
+    EXPECT_EQ(asLines(simFilesOf({}, {{"CurrentModes", QVariantList{0xFFFFFFFFU, 0U}}})),
+              "kSimFile_ICCID: \n"
+              "kSimFile_MSISDN: \n"
+              "kSimFile_AHPLMN: \n"
+              "kSimFile_RATMODE: \n"
+              "kSimFile_PNN: \n");
 }
 
 TEST(BearerRows, OfAConnectedBearer)
@@ -149,7 +150,7 @@ TEST(BearerRows, OfAConnectedBearer)
         {"Ip6Config",
          QVariantMap{{"address", "2001:db8::25"}, {"dns1", "2001:db8::53"}, {"dns2", "2001:db8::54"}}},
         {"Stats", QVariantMap{{"duration", 95U}, {"rx-bytes", 5000000000ULL}, {"tx-bytes", 42ULL}}}};
-    EXPECT_EQ(shown(bearerRows("/org/freedesktop/ModemManager1/Bearer/12", bearer)),
+    EXPECT_EQ(asLines(bearerRows("/org/freedesktop/ModemManager1/Bearer/12", bearer)),
               "Context ID: 12\n"
               "APN: internet.example\n"
               "PDP Type: IPv4v6\n"
@@ -165,14 +166,14 @@ TEST(BearerRows, OfAConnectedBearer)
 
 TEST(BearerRows, OfBearersThatAreNotActive)
 {
-    EXPECT_EQ(shown(bearerRows("/1", {{"Properties", QVariantMap{{"apn", "a"}, {"ip-type", 1U}}}})),
+    EXPECT_EQ(asLines(bearerRows("/1", {{"Properties", QVariantMap{{"apn", "a"}, {"ip-type", 1U}}}})),
               "Context ID: 1\nAPN: a\nPDP Type: IPv4\nState: Inactive\n");
-    EXPECT_EQ(shown(bearerRows("/2", {{"Connected", true},
-                                      {"Suspended", true},
-                                      {"Properties", QVariantMap{{"ip-type", 8U}}},
-                                      {"Stats", QVariantMap{{"duration", -1}}}})),
+    EXPECT_EQ(asLines(bearerRows("/2", {{"Connected", true},
+                                        {"Suspended", true},
+                                        {"Properties", QVariantMap{{"ip-type", 8U}}},
+                                        {"Stats", QVariantMap{{"duration", -1}}}})),
               "Context ID: 2\nPDP Type: Non-IP\nState: Suspended\n");
-    EXPECT_EQ(shown(bearerRows("/3", {{"Connected", 1}, {"Properties", 5}, {"Interface", 7}})),
+    EXPECT_EQ(asLines(bearerRows("/3", {{"Connected", 1}, {"Properties", 5}, {"Interface", 7}})),
               "Context ID: 3\nState: Inactive\n");
 }
 

@@ -10,11 +10,6 @@ namespace {
 
 class ModemFeedTest : public ModemFixture {};
 
-QVariantMap lteCell(bool serving, const char* identity, unsigned earfcn)
-{
-    return {{"cell-type", 5U}, {"serving", serving}, {"physical-ci", identity}, {"earfcn", earfcn}};
-}
-
 } // namespace
 
 TEST_F(ModemFeedTest, ShowsTheServingCellWithoutCellInfo)

@@ -105,6 +105,11 @@ void ModemFixture::answerCells(const QList<QVariantMap>& cells)
     fake->answers["GetCellInfo"] = {{QVariant::fromValue(cells)}};
 }
 
+QVariantMap ModemFixture::lteCell(bool serving, const char* identity, unsigned earfcn)
+{
+    return {{"cell-type", 5U}, {"serving", serving}, {"physical-ci", identity}, {"earfcn", earfcn}};
+}
+
 std::unique_ptr<TestClient> ModemFixture::client(std::vector<int> codes)
 {
     auto made = std::make_unique<TestClient>("client" + std::to_string(++clients));

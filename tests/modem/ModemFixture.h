@@ -34,6 +34,7 @@ protected:
     void plugIn(const QString& path = kModemPath);
     void answerLocation(const char* text);
     void answerCells(const QList<QVariantMap>& cells);
+    static QVariantMap lteCell(bool serving, const char* identity, unsigned earfcn);
 
     /// A client that asked for those of the server's own codes, 0 to 2.
     std::unique_ptr<TestClient> client(std::vector<int> codes = {0, 1, 2});

@@ -10,13 +10,13 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr HandsetTime kStart = std::chrono::sys_days(std::chrono::year(2024) / 5 / 1);
+constexpr HandsetTime kMidnight = std::chrono::sys_days(std::chrono::year(2024) / 5 / 1);
 
 } // namespace
 
 TEST(MessageBatch, FillsInTheHeader)
 {
-    MessageBatch batch(kStart);
+    MessageBatch batch(kMidnight);
     batch.packet(0xB17F, 33).put(u8(32), 9);
     const PacketReader packet(batch[0].bytes);
     ASSERT_EQ(packet.size(), 33U);
@@ -29,7 +29,7 @@ TEST(MessageBatch, FillsInTheHeader)
 
 TEST(MessageBatch, GivesListsTheServersLogType)
 {
-    MessageBatch batch(kStart);
+    MessageBatch batch(kMidnight);
     const std::vector<std::byte> list(300, std::byte{'x'});
     batch.list(0xFF0001, list);
     const PacketReader packet(batch[0].bytes);
@@ -46,9 +46,9 @@ TEST(MessageBatch, StampsUnitsOf1250MicrosecondsSince1980)
 {
     EXPECT_EQ(logTime(HandsetTime(std::chrono::sys_days(std::chrono::year(1980) / 1 / 6))), 0U);
     // 16187 days and 3.125 ms later
-    EXPECT_EQ(logTime(kStart + 3125us), (16187ULL * 86400 * 800 + 2) << 16 | 0x8000);
+    EXPECT_EQ(logTime(kMidnight + 3125us), (16187ULL * 86400 * 800 + 2) << 16 | 0x8000);
 
-    MessageBatch batch(kStart);
+    MessageBatch batch(kMidnight);
     batch.setTime(3125us);
     batch.packet(0xB0C1, 22);
     const PacketReader packet(batch[0].bytes);
@@ -59,7 +59,7 @@ TEST(MessageBatch, StampsUnitsOf1250MicrosecondsSince1980)
 
 TEST(MessageBatch, DoesNotCarryOldBytesIntoNewPackets)
 {
-    MessageBatch batch(kStart);
+    MessageBatch batch(kMidnight);
     batch.list(0xFF0000, std::vector<std::byte>(100, std::byte{0xEE}));
     batch.packet(0xB17F, 33).put(u8(32), 0xFF); // writes into the slack behind it
     batch.packet(0xB0C1, 22);

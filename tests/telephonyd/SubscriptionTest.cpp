@@ -9,7 +9,7 @@ namespace pelorus::test {
 
 namespace {
 
-Value startCommand(std::vector<Value> basebandCodes, std::vector<Value> serverCodes)
+Value commandOf(std::vector<Value> basebandCodes, std::vector<Value> serverCodes)
 {
     return makeDictionary({{"SetState", "Streaming"},
                            {"SetOspreyLogCodes", makeArray(std::move(basebandCodes))},
@@ -31,7 +31,7 @@ std::vector<std::byte> prefixed(unsigned type, unsigned code)
 TEST(Subscription, WantsTheCodesOfTheStartCommandAndNoOthers)
 {
     std::string why;
-    const auto wanted = Subscription::fromStartCommand(startCommand({45433, 45439}, {0, 2}), why);
+    const auto wanted = Subscription::fromStartCommand(commandOf({45433, 45439}, {0, 2}), why);
     ASSERT_TRUE(wanted) << why;
     EXPECT_TRUE(wanted->wants(message(1, 0xB179)));
     EXPECT_TRUE(wanted->wants(message(1, 0xB17F)));
@@ -46,7 +46,7 @@ TEST(Subscription, WantsTheCodesOfTheStartCommandAndNoOthers)
 TEST(Subscription, ReadsCodesBehindAPrefix)
 {
     std::string why;
-    const auto wanted = Subscription::fromStartCommand(startCommand({0xB179}, {1}), why);
+    const auto wanted = Subscription::fromStartCommand(commandOf({0xB179}, {1}), why);
     EXPECT_TRUE(wanted->wants(prefixed(1, 0xB179)));
     EXPECT_TRUE(wanted->wants(prefixed(0xFF, 1)));
     EXPECT_FALSE(wanted->wants(prefixed(2, 0xB179)));
@@ -59,7 +59,7 @@ TEST(Subscription, DoesNotWantMessagesWithoutAReadableCode)
     std::vector<Value> all;
     for (int code = 0; code < 0x10000; ++code)
         all.emplace_back(code);
-    const auto wanted = Subscription::fromStartCommand(startCommand(all, all), why);
+    const auto wanted = Subscription::fromStartCommand(commandOf(all, all), why);
     ASSERT_TRUE(wanted);
     EXPECT_TRUE(wanted->wants(message(1, 0)));
     for (std::size_t length = 0; length < 13; ++length)
@@ -81,7 +81,7 @@ TEST(Subscription, TakesAStartCommandWithoutCodes)
     const auto none = Subscription::fromStartCommand(makeDictionary({{"SetState", "Streaming"}}), why);
     ASSERT_TRUE(none);
     EXPECT_FALSE(none->wants(message(1, 0xB179)));
-    EXPECT_TRUE(Subscription::fromStartCommand(startCommand({}, {}), why));
+    EXPECT_TRUE(Subscription::fromStartCommand(commandOf({}, {}), why));
 }
 
 TEST(Subscription, RefusesWhatIsNoStartCommand)
@@ -93,13 +93,13 @@ TEST(Subscription, RefusesWhatIsNoStartCommand)
         {makeDictionary({{"SetState", "Idle"}}), "a \"SetState\" that is not \"Streaming\""},
         {makeDictionary({{"SetState", "Streaming"}, {"SetOspreyLogCodes", 45433}}),
          "a start command that cannot be followed: its \"SetOspreyLogCodes\" is no array"},
-        {startCommand({0x10000}, {}),
+        {commandOf({0x10000}, {}),
          "a start command that cannot be followed: its \"SetOspreyLogCodes\" holds something that is no log "
          "code"},
-        {startCommand({}, {-1}),
+        {commandOf({}, {-1}),
          "a start command that cannot be followed: its \"SetCtExtraCodes\" holds something that is no log "
          "code"},
-        {startCommand({}, {"1"}),
+        {commandOf({}, {"1"}),
          "a start command that cannot be followed: its \"SetCtExtraCodes\" holds something that is no log "
          "code"},
     };
@@ -113,7 +113,7 @@ TEST(Subscription, RefusesWhatIsNoStartCommand)
 TEST(Subscription, CountsInItsDescription)
 {
     std::string why;
-    EXPECT_EQ(Subscription::fromStartCommand(startCommand({1, 2, 2}, {0}), why)->description(),
+    EXPECT_EQ(Subscription::fromStartCommand(commandOf({1, 2, 2}, {0}), why)->description(),
               "2 log codes and 1 of the server's own");
     EXPECT_EQ(Subscription::toEverything().description(), "everything");
 }

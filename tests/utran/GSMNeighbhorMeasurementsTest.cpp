@@ -11,7 +11,7 @@ namespace {
 
 using testing::ElementsAre;
 
-PacketBuilder cells(unsigned count)
+PacketBuilder gsmCells(unsigned count)
 {
     return PacketBuilder(17 + 8 * count).u8(16, count);
 }
@@ -29,10 +29,10 @@ TEST_F(GSMNeighbhorMeasurementsTest, SubscribesToTheGSMNeighbors)
 
 TEST_F(GSMNeighbhorMeasurementsTest, LeavesItsListEmptyWhateverItRead)
 {
-    section.receive(0xD00E, cells(5));
+    section.receive(0xD00E, gsmCells(5));
     EXPECT_EQ(section.shown(), "");
     EXPECT_THAT(section.logged(), ElementsAre("<4>GSM Neighbor Cell List"));
-    section.receive(0xD00E, cells(255));
+    section.receive(0xD00E, gsmCells(255));
     EXPECT_EQ(section.shown(), "");
 }
 
@@ -51,20 +51,20 @@ TEST_F(GSMNeighbhorMeasurementsTest, KeepsTheListWhenThePacketIsOneByteShort)
 
 TEST_F(GSMNeighbhorMeasurementsTest, IgnoresOtherCodes)
 {
-    section.receive(0xD00A, cells(5));
+    section.receive(0xD00A, gsmCells(5));
     EXPECT_EQ(section.shown(), "- left over\n");
     EXPECT_THAT(section.logged(), ElementsAre("<4>GSM Neighbor Cell List"));
 }
 
 TEST_F(GSMNeighbhorMeasurementsTest, RaisesWhenThePacketEndsBeforeItsCellsAndLeavesTheListEmpty)
 {
-    EXPECT_THROW(section.receive(0xD00E, cells(5).length(56)), ArrayOutOfBoundsException);
+    EXPECT_THROW(section.receive(0xD00E, gsmCells(5).length(56)), ArrayOutOfBoundsException);
     EXPECT_EQ(section.shown(), "");
 }
 
 TEST_F(GSMNeighbhorMeasurementsTest, RaisesForEveryPrefixThatIsLongEnoughForTheCountOnly)
 {
-    forEachPrefix(cells(2).bytes(), [this](const LogPacket& packet) {
+    forEachPrefix(gsmCells(2).bytes(), [this](const LogPacket& packet) {
         if (packet.size() >= 17 && packet.size() < 33)
             EXPECT_THROW(section.section.updateWithData(packet, 0xD00E), ArrayOutOfBoundsException)
                 << packet.size();

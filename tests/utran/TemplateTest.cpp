@@ -1,6 +1,7 @@
 #include "tests/support/TemplateFixture.h"
 
 #include "LogGenerator/Osprey/UTRAN/UTRANLogGenerator.h"
+#include "tests/utran/Sections.h"
 
 #include <gmock/gmock.h>
 
@@ -11,10 +12,6 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 using testing::Not;
-
-constexpr const char* kKeyedSections[] = {"RRC Info", "Serving Cell Info", "SIM Info"};
-constexpr const char* kListSections[] = {"Neighbor Cell List", "GSM Neighbor Cell List", "TRCH BLER",
-                                         "CCTRCH SIR", "PDP Context Info"};
 
 class UTRANTemplate : public testing::Test {
 protected:

@@ -3,6 +3,7 @@
 #include "tests/support/HostilePackets.h"
 #include "tests/support/PacketBuilder.h"
 #include "tests/support/RecordingLog.h"
+#include "tests/utran/Sections.h"
 
 #include <gmock/gmock.h>
 
@@ -12,9 +13,6 @@ namespace {
 using testing::ElementsAre;
 using testing::UnorderedElementsAre;
 
-constexpr const char* kKeyedSections[] = {"RRC Info", "Serving Cell Info", "SIM Info"};
-constexpr const char* kListSections[] = {"Neighbor Cell List", "GSM Neighbor Cell List", "TRCH BLER",
-                                         "CCTRCH SIR", "PDP Context Info"};
 constexpr LogCode kCodes[] = {0xD0E0, 0xD0E2, 0xD00A, 0xD00E, 0xD00C, 0x1234, 0xFF0000, 0xFF0001, 0xFF0002};
 
 std::vector<std::string> subscribers(const ClassIndex& index, LogCode code)
