@@ -13,7 +13,7 @@ namespace {
 bool isSeen()
 {
     const QString platform = QGuiApplication::platformName();
-    return platform != QStringLiteral("offscreen") && platform != QStringLiteral("minimal");
+    return platform != QLatin1String("offscreen") && platform != QLatin1String("minimal");
 }
 
 } // namespace

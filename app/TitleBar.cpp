@@ -34,7 +34,7 @@ TitleBar::TitleBar(std::function<void()> back, QWidget* parent)
     button->setFixedHeight(kBarHeight - 2 * kSpace);
     button->hide();
     drawArrow();
-    connect(button, &QToolButton::clicked, this, [back = std::move(back)] { back(); });
+    connect(button, &QToolButton::clicked, this, std::move(back));
 }
 
 void TitleBar::setTitle(const QString& title)

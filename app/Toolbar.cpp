@@ -28,7 +28,7 @@ Toolbar::Toolbar(std::function<void()> save, QWidget* parent)
     button->setToolTip(tr("Save a snapshot (Ctrl+S)"));
     button->setFocusPolicy(Qt::TabFocus);
     button->setMinimumHeight(32);
-    connect(button, &QToolButton::clicked, this, [save = std::move(save)] { save(); });
+    connect(button, &QToolButton::clicked, this, std::move(save));
 
     auto* layout = new QHBoxLayout(this);
     layout->setContentsMargins(kMargin, 1, kMargin, 0);

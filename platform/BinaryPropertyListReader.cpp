@@ -9,7 +9,6 @@
 #include <algorithm>
 #include <bit>
 #include <cmath>
-#include <cstring>
 #include <optional>
 #include <vector>
 
@@ -239,8 +238,7 @@ bool BinaryPropertyListReader::readText(const Object& object, std::string& out)
         out.assign(text, object.count);
     else
         utf8FromUtf16({text, object.count * 2}, out);
-    return std::memchr(out.data(), 0, out.size()) == nullptr ||
-           refuse("the binary property list holds a NUL in a string");
+    return out.find('\0') == std::string::npos || refuse("the binary property list holds a NUL in a string");
 }
 
 bool BinaryPropertyListReader::readKey(std::uint64_t index, std::optional<Key>& out)

@@ -19,7 +19,8 @@ LinuxTimer::LinuxTimer(QObject& owner, Seconds interval, std::function<void()> t
 {
     timer->setTimerType(Qt::PreciseTimer);
     timer->callOnTimeout([tick = std::make_shared<std::function<void()>>(std::move(tick))] {
-        const auto running = tick; // it may drop the timer, and this closure with it
+        // A copy: the tick may drop the timer, and this closure with it.
+        const auto running = tick; // NOLINT(performance-unnecessary-copy-initialization)
         callAtBoundary(*running);
     });
     timer->start(timerDuration(std::chrono::round<std::chrono::nanoseconds>(interval)));

@@ -110,7 +110,7 @@ void LogChannel::start(const Value& command)
     if (setup.technology == "IFX") // its messages have no codes to choose from
         subscription = Subscription::toEverything();
     say(fmt::format("client streaming, {}", subscription->description()));
-    setup.stream.subscribe(*std::move(subscription));
+    setup.stream.subscribe(*subscription);
     atEnd = false;
     if (!sinceStart.isValid())
         sinceStart.start();

@@ -33,6 +33,7 @@ public:
     virtual void subscribe(const Subscription&) {}
     /// For a source that has no end: `more` is called, from the event loop, when next() has something again.
     /// False when the source ends.
+    // NOLINTNEXTLINE(performance-unnecessary-value-param): those who override it keep it
     virtual bool awaitMore(std::function<void()> /*more*/) { return false; }
 };
 

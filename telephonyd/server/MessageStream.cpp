@@ -6,9 +6,9 @@ MessageStream::MessageStream(std::unique_ptr<MessageSource> source, Pace pace, b
     : source(std::move(source)), pace(pace), loop(loop)
 {}
 
-void MessageStream::subscribe(Subscription wanted)
+void MessageStream::subscribe(const Subscription& wanted)
 {
-    subscription = std::move(wanted);
+    subscription = wanted;
     source->subscribe(subscription);
     if (pending)
         pending = subscription.wants(message.bytes);

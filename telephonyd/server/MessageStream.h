@@ -30,7 +30,7 @@ public:
     MessageStream(std::unique_ptr<MessageSource> source, Pace pace, bool loop);
 
     /// Replaces the subscription; before there is one, nothing is sent.
-    void subscribe(Subscription wanted);
+    void subscribe(const Subscription& wanted);
     /// Called when a stream that waited forMore has some.
     void onMore(std::function<void()> callback) { endless = source->awaitMore(std::move(callback)); }
     /// Sends what is due `now`, counted from the start of the stream.

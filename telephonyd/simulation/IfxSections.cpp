@@ -106,7 +106,7 @@ std::shared_ptr<Dictionary> ifxDedicatedChannel(const IfxConnection& connection)
         frequencies->elements.emplace_back(number(arfcn));
     return makeDictionary(
         {{"Type", "TCH/F"},
-         {"Timeslot", number(2 + connection.serving % 4)},
+         {"Timeslot", number(static_cast<std::int64_t>(2 + connection.serving % 4))},
          {"Hopping", makeDictionary({{"HSN", number(cell.hoppingSequence)}, {"Frequencies", frequencies}})},
          {"RxQual", number(connection.quality)},
          {"Timing Advance", number(timingAdvance(connection))},

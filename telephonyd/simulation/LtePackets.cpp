@@ -7,6 +7,9 @@
 #include "LogGenerator/Osprey/LTE/LogCode_0xB180.h"
 #include "telephonyd/simulation/LteCellChoice.h"
 
+#include <algorithm>
+#include <cmath>
+
 namespace pelorus {
 
 namespace {
@@ -59,7 +62,7 @@ void writeNeighbour(PacketWriter record, const LteRadio& radio, std::size_t serv
 
 int stepsAbove(double lowest, double level, double stepsPerUnit)
 {
-    return static_cast<int>(std::max(0.0, (level - lowest) * stepsPerUnit) + 0.5);
+    return static_cast<int>(std::lround(std::max(0.0, (level - lowest) * stepsPerUnit)));
 }
 
 void writeServingCell(MessageBatch& log, std::size_t serving)

@@ -24,6 +24,7 @@ constexpr double kHighestRsrp = -44.0;
 std::vector<Antenna> antennas()
 {
     std::vector<Antenna> result;
+    result.reserve(kLteCells.size());
     for (const LteCell& cell : kLteCells)
         result.push_back({cell.site, cell.eastward, cell.northward,
                           kPowerPerSubcarrier - kLteCarriers[cell.carrier].extraLoss});

@@ -36,7 +36,7 @@ std::size_t MessageBatch::begin(std::uint32_t code, std::size_t length)
     header.put(kLogType, code < kInternalCodes ? kBaseband : kTelephonyServer);
     header.put(kRecordLength, static_cast<std::int64_t>(length - 1));
     header.put(kLogCode, code & 0xFFFF);
-    header.put(kTimeStampLow, stamp & 0xFFFFFFFF);
+    header.put(kTimeStampLow, static_cast<std::int64_t>(stamp & 0xFFFFFFFF));
     header.put(kTimeStampHigh, static_cast<std::int64_t>(stamp >> 32));
     return first;
 }

@@ -42,8 +42,8 @@ std::size_t SoftHandover::worst(const UmtsRadio& radio) const
 
 void SoftHandover::remove(std::size_t cell)
 {
-    std::remove(cells.begin(), cells.begin() + static_cast<std::ptrdiff_t>(count), cell);
-    --count;
+    const auto end = std::remove(cells.begin(), cells.begin() + static_cast<std::ptrdiff_t>(count), cell);
+    count = static_cast<std::size_t>(end - cells.begin());
 }
 
 void SoftHandover::update(const UmtsRadio& radio, double seconds)
