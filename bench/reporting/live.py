@@ -129,7 +129,7 @@ def live(programs, scratch, length):
         rows = [[f"{rate:,}", name, share(index, 0), megabytes(resident(client)), share(index, 1)]
                 for index, (rate, name, client, server) in enumerate(running)]
     log = ("A system log takes the lines at `/dev/log`." if pathlib.Path("/dev/log").is_socket() else
-           "No system log takes the lines, `/dev/log` is not there: each line is an attempt to connect.")
+           "No system log takes the lines, `/dev/log` is not there.")
     head = ["messages/s", "program", "of one core", "peak resident", "the server's part of a core"]
     return f"{table(head, rows)}\n\n{log}"
 
