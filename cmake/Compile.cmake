@@ -74,9 +74,8 @@ function(pelorus_compile_singly)
   set_target_properties(${ARGN} PROPERTIES UNITY_BUILD OFF)
 endfunction()
 
-# pelorus_precompile(TARGET HEADERS...): the standard library's and the given headers are read once for the target, which
-# has many small sources.
+# pelorus_precompile(TARGET): the standard library's headers are read once for the target, which has many small sources.
 function(pelorus_precompile target)
   target_precompile_headers(${target} PRIVATE <algorithm> <array> <chrono> <functional> <memory> <optional> <span> <string>
-                                              <string_view> <unordered_map> <variant> <vector> <fmt/format.h> ${ARGN})
+                                              <string_view> <unordered_map> <variant> <vector> <fmt/format.h>)
 endfunction()

@@ -30,11 +30,7 @@ constexpr double kHighestLevel = -25.0;
 
 std::vector<Antenna> antennas()
 {
-    std::vector<Antenna> result;
-    result.reserve(kCdmaSectors.size());
-    for (const CdmaSector& sector : kCdmaSectors)
-        result.push_back({sector.site, sector.eastward, sector.northward, kFullPower});
-    return result;
+    return antennasOf(kCdmaSectors, [](const CdmaSector&) { return kFullPower; });
 }
 
 } // namespace

@@ -15,11 +15,7 @@ constexpr double kLowestFound = -104.0;
 
 std::vector<Antenna> antennas()
 {
-    std::vector<Antenna> result;
-    result.reserve(kGsmCells.size());
-    for (const GsmCell& cell : kGsmCells)
-        result.push_back({cell.site, cell.eastward, cell.northward, kPower});
-    return result;
+    return antennasOf(kGsmCells, [](const GsmCell&) { return kPower; });
 }
 
 } // namespace

@@ -23,12 +23,9 @@ constexpr double kHighestRsrp = -44.0;
 
 std::vector<Antenna> antennas()
 {
-    std::vector<Antenna> result;
-    result.reserve(kLteCells.size());
-    for (const LteCell& cell : kLteCells)
-        result.push_back({cell.site, cell.eastward, cell.northward,
-                          kPowerPerSubcarrier - kLteCarriers[cell.carrier].extraLoss});
-    return result;
+    return antennasOf(kLteCells, [](const LteCell& cell) {
+        return kPowerPerSubcarrier - kLteCarriers[cell.carrier].extraLoss;
+    });
 }
 
 } // namespace

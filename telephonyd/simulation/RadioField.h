@@ -17,6 +17,16 @@ struct Antenna {
     double power;
 };
 
+/// Those of all cells of a network; `power` gives a cell's, in the antenna's unit.
+template <class Cells, class Power> std::vector<Antenna> antennasOf(const Cells& cells, Power power)
+{
+    std::vector<Antenna> antennas;
+    antennas.reserve(cells.size());
+    for (const auto& cell : cells)
+        antennas.push_back({cell.site, cell.eastward, cell.northward, power(cell)});
+    return antennas;
+}
+
 /// The levels of cells as they reach a car. Path loss grows with distance and behind the antennas; houses
 /// cast shadows that change over tens of metres, half of it the same for all cells of a site; what is left
 /// fades from one measurement to the next.

@@ -25,11 +25,7 @@ constexpr double kLowestEcio = -18.0;
 
 std::vector<Antenna> antennas()
 {
-    std::vector<Antenna> result;
-    result.reserve(kUmtsCells.size());
-    for (const UmtsCell& cell : kUmtsCells)
-        result.push_back({cell.site, cell.eastward, cell.northward, kPilotPower});
-    return result;
+    return antennasOf(kUmtsCells, [](const UmtsCell&) { return kPilotPower; });
 }
 
 } // namespace

@@ -21,11 +21,7 @@ constexpr double kLowestDetected = -108.0;
 
 std::vector<Antenna> antennas()
 {
-    std::vector<Antenna> result;
-    result.reserve(kUtranCells.size());
-    for (const UtranCell& cell : kUtranCells)
-        result.push_back({cell.site, cell.eastward, cell.northward, kBeaconPower});
-    return result;
+    return antennasOf(kUtranCells, [](const UtranCell&) { return kBeaconPower; });
 }
 
 } // namespace
